@@ -1,0 +1,18 @@
+#!/bin/sh
+# Installs what is missing, then builds and runs the whole suite twice: a release build,
+# and one under AddressSanitizer and UndefinedBehaviorSanitizer.
+set -eu
+cd "$(dirname "$0")/.."
+./scripts/install-deps.sh
+jobs=$(nproc 2>/dev/null || echo 2)
+for config in release sanitize; do
+  dir=build-$config
+  case $config in
+    release) flags="-DCMAKE_BUILD_TYPE=Release" ;;
+    sanitize) flags="-DCMAKE_BUILD_TYPE=RelWithDebInfo -DKXVFIX_SANITIZE=ON" ;;
+  esac
+  echo "== $config"
+  cmake -S . -B "$dir" $flags >/dev/null
+  cmake --build "$dir" -j "$jobs"
+  ctest --test-dir "$dir" -j "$jobs" --output-on-failure
+done

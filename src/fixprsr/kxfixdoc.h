@@ -1,0 +1,35 @@
+// Reader that sees a source file as FIX fields: tag, "=", value, separator.
+#pragma once
+
+#include <cstdint>
+
+#include "kxutil/kxfileproxy.h"
+#include "kxutil/kxwstring.h"
+#include "kxvfixexport.h"
+
+class KXVFIX_API KXFIXDoc : public KXFileProxy {
+  public:
+    // peekTag gathers at most this many characters, so that a file without "=" is
+    // never held in memory whole; the tag then reads as this long prefix.
+    static constexpr int32_t kMaxTagLength = 1024;
+
+    KXFIXDoc() = default;
+    KXFIXDoc(const KXFIXDoc& other) = default;
+    KXFIXDoc& operator=(const KXFIXDoc& other) = default;
+    ~KXFIXDoc() override;
+
+    // After an optional byte-order mark and blank or ";" comment lines, the file starts
+    // with "8". The reader is left on that first significant character.
+    bool isFIXFile();
+    // The next field's tag (everything before the next "="); nothing is consumed.
+    int32_t peekTag(KXWString& tag);
+    // Consumes one field and yields its value (every "=" dropped, up to the separator).
+    int32_t readValue(KXWString& value);
+    // Sum of the codes of every character the last readValue consumed.
+    int64_t lastFieldSum() const { return lastFieldSum_; }
+
+  private:
+    int64_t savedPos = 0;
+    char fieldSeparator = 1;  // SOH
+    int64_t lastFieldSum_ = 0;
+};

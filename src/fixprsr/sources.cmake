@@ -1,0 +1,1 @@
+# Sources of this area, added to the plug-in's objects.
