@@ -1,0 +1,7 @@
+// Where the program's plug-in and bundled schemas lie, relative to the program itself.
+#pragma once
+
+#include <string>
+
+std::string defaultPluginPath();
+std::string defaultSchemaPath();
