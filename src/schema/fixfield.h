@@ -4,6 +4,7 @@
 
 #include <cstdint>
 #include <map>
+#include <vector>
 
 #include "kxutil/kxwstring.h"
 #include "kxvfixexport.h"
@@ -44,6 +45,9 @@ class KXVFIX_API FIXField {
     void setChildren(FIXFieldList* list) { children = list; }
 
   private:
+    // Moves the children into out, leaving this node without a list.
+    void detachChildren(std::vector<FIXField*>& out);
+
     KXWString tag;
     KXWString qualifiedTag;
     KXWString name;

@@ -103,3 +103,15 @@ TEST(FIXField, GroupOwnsItsWholeSubtree) {
 }
 
 }  // namespace
+
+namespace {
+
+TEST(FIXField, DeepNestingIsDestroyedWithoutRecursion) {
+    auto* root = new FIXField;
+    FIXField* inner = root;
+    for (int depth = 0; depth < 200000; ++depth) inner = inner->addChild(nullptr);
+    ASSERT_NE(inner, nullptr);
+    delete root;  // would overflow the stack if destruction recursed
+}
+
+}  // namespace
