@@ -1,5 +1,7 @@
 #include "fix/kxfixvalidator.h"
 
+#include <mutex>
+
 #include <xercesc/util/PlatformUtils.hpp>
 #include <xercesc/util/XMLException.hpp>
 #include <xercesc/util/XMLUni.hpp>
@@ -7,7 +9,16 @@
 #include "fix/options.h"
 #include "kxutil/kxxmlutils.h"
 
+namespace {
+
+// Validators may be made on several threads at once, and the XML library's
+// initialisation is not safe to run concurrently: the plug-in's one lock.
+std::mutex xmlInitMutex;
+
+}  // namespace
+
 KXFIXValidator::KXFIXValidator() {
+    const std::lock_guard<std::mutex> lock(xmlInitMutex);
     try {
         xercesc::XMLPlatformUtils::Initialize(xercesc::XMLUni::fgXercescDefaultLocale, nullptr,
                                               nullptr, nullptr);
