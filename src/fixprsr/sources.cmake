@@ -1,1 +1,3 @@
 # Sources of this area, added to the plug-in's objects.
+target_sources(kxvfix_objects PRIVATE
+  ${CMAKE_CURRENT_LIST_DIR}/islike.cpp)
