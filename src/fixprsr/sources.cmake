@@ -1,3 +1,4 @@
 # Sources of this area, added to the plug-in's objects.
 target_sources(kxvfix_objects PRIVATE
+  ${CMAKE_CURRENT_LIST_DIR}/decimal.cpp
   ${CMAKE_CURRENT_LIST_DIR}/islike.cpp)
