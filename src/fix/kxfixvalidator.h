@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstdint>
+#include <vector>
 
 #include "fixprsr/kxfixdoc.h"
 #include "kxapi/kxvalidator.h"
@@ -34,6 +35,19 @@ class KXVFIX_API KXFIXValidator : public KXValidator {
     BATCHERR parseGroup(FIXFieldList* fields, KXFIXDoc& doc, int repetitions, int64_t& checkTotal);
     BATCHERR checkValidField(const KXWString& pattern, const KXWString& value);
     bool isLike(const KXWString& value, const KXWString& pattern);
+
+    // One open group of parseGroup's walk: kept on the heap, not the call stack, so that
+    // deeply nested groups cannot overflow it.
+    struct GroupLevel {
+        FIXFieldList* fields;
+        int repetitions;  // still to walk, the current one included
+        int32_t member;   // next member to try in the current repetition
+        bool readAny;     // whether the current repetition consumed a field
+    };
+    // Working storage of the walk, reused so that reading a field allocates nothing.
+    std::vector<GroupLevel> groupLevels;
+    KXWString fieldTag;
+    KXWString fieldValue;
 
     bool xmlReady = true;
     KXWString xmlInitError;
