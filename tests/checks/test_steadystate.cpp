@@ -22,6 +22,13 @@ void* operator new(size_t size) {
 void* operator new[](size_t size) {
     return operator new(size);
 }
+void* operator new(size_t size, const std::nothrow_t&) noexcept {
+    ++allocations;
+    return std::malloc(size != 0 ? size : 1);
+}
+void* operator new[](size_t size, const std::nothrow_t& tag) noexcept {
+    return operator new(size, tag);
+}
 void operator delete(void* p) noexcept {
     std::free(p);
 }
@@ -32,6 +39,12 @@ void operator delete(void* p, size_t) noexcept {
     std::free(p);
 }
 void operator delete[](void* p, size_t) noexcept {
+    std::free(p);
+}
+void operator delete(void* p, const std::nothrow_t&) noexcept {
+    std::free(p);
+}
+void operator delete[](void* p, const std::nothrow_t&) noexcept {
     std::free(p);
 }
 
