@@ -1,1 +1,4 @@
 # Sources of this area, added to the plug-in's objects.
+target_sources(kxvfix_objects PRIVATE
+  ${CMAKE_CURRENT_LIST_DIR}/fixkxschemaspec.cpp
+  ${CMAKE_CURRENT_LIST_DIR}/loadschema.cpp)
