@@ -59,8 +59,8 @@ class KxvalidateTest(unittest.TestCase):
         cmd = [KXVALIDATE] + (["-s", self.schema] if schema else []) + list(args)
         return subprocess.run(cmd, capture_output=True, text=True, timeout=60)
 
-    def json_lines(self, *args):
-        done = self.run_cli("--format", "json", *args)
+    def json_lines(self, *args, schema=True):
+        done = self.run_cli("--format", "json", *args, schema=schema)
         return done, [json.loads(line) for line in done.stdout.splitlines()]
 
     def test_clean_message_after_a_blank_line(self):
@@ -163,6 +163,17 @@ class KxvalidateTest(unittest.TestCase):
         done = self.run_cli("-o", "Unicode=True", "-o", "schemafile=" + self.schema,
                             self.write("u.fix", data), schema=False)
         self.assertEqual(done.returncode, 0, done.stdout)
+
+    def test_examples_with_the_bundled_schema(self):
+        examples = os.path.join(os.path.dirname(__file__), "..", "..", "examples")
+        clean = [os.path.join(examples, n) for n in ("orders.fix", "executions.fix")]
+        self.assertEqual(self.run_cli(*clean, schema=False).returncode, 0)
+        faults = os.path.join(examples, "faults.fix")
+        done, objects = self.json_lines(faults, schema=False)
+        self.assertEqual([o.get("message") for o in objects[:-1]], [
+            "Field 54 failed to match specified value", "The Checksum is incorrect",
+            "The Checksum length is incorrect", "The Checksum is incorrect",
+            "Field 448 is missing", "Failed to match tag=9999 in schema file"])
 
 
 if __name__ == "__main__":
