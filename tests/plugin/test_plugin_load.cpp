@@ -10,6 +10,7 @@
 #include "kxapi/kxvalidator.h"
 #include "kxutil/kxglob.h"
 
+#if defined(KXVFIX_TEST_MIMALLOC)
 namespace {
 
 std::atomic<int> hostNews{0};
@@ -17,6 +18,7 @@ std::atomic<int> hostNews{0};
 }  // namespace
 
 // This host brings its own allocator; the plug-in must neither replace nor use it.
+// Only with the plug-in's allocator bound: without it the plug-in would share these.
 void* operator new(size_t size) {
     ++hostNews;
     if (void* p = std::malloc(size != 0 ? size : 1)) return p;
@@ -28,6 +30,7 @@ void operator delete(void* p) noexcept {
 void operator delete(void* p, size_t) noexcept {
     std::free(p);
 }
+#endif
 
 namespace {
 
