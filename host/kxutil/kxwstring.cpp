@@ -36,11 +36,6 @@ KXWString::~KXWString() {
     delete[] data_;
 }
 
-KXWString& KXWString::operator=(const KXWString& other) {
-    if (this != &other) assign(other.data_, other.length_);
-    return *this;
-}
-
 KXWString& KXWString::operator=(KXWString&& other) noexcept {
     if (this != &other) {
         delete[] data_;
@@ -66,20 +61,6 @@ KXWString& KXWString::operator+=(const KXWString& other) {
 KXWString& KXWString::operator+=(const char16_t* text) {
     append(text, textLength(text));
     return *this;
-}
-
-bool KXWString::operator==(const KXWString& other) const {
-    return length_ == other.length_ && std::equal(c_str(), c_str() + length_, other.c_str());
-}
-
-bool KXWString::operator!=(const char16_t* text) const {
-    const int32_t n = textLength(text);
-    return n != length_ || !std::equal(c_str(), c_str() + length_, text);
-}
-
-bool KXWString::operator<(const KXWString& other) const {
-    return std::lexicographical_compare(c_str(), c_str() + length_, other.c_str(),
-                                        other.c_str() + other.length_);
 }
 
 int32_t KXWString::find(char16_t c, int32_t start) const {

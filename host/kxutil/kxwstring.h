@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <string_view>
 
 #include "kxexport.h"
 #include "kxutil/kxcset.h"
@@ -18,7 +19,20 @@ class KXUTIL_API KXWString {
     KXWString(const char16_t* text, int32_t length = -1);
     virtual ~KXWString();
 
-    KXWString& operator=(const KXWString& other);
+    // Into storage that is large enough, copying allocates nothing and stays inline: the
+    // walk copies every tag it reads.
+    KXWString& operator=(const KXWString& other) {
+        if (this != &other) {
+            if (other.length_ < capacity_) {
+                for (int32_t i = 0; i < other.length_; ++i) data_[i] = other.data_[i];
+                length_ = other.length_;
+                data_[length_] = 0;
+            } else {
+                assign(other.data_, other.length_);
+            }
+        }
+        return *this;
+    }
     KXWString& operator=(KXWString&& other) noexcept;
     KXWString& operator=(const char16_t* text);
 
@@ -31,9 +45,13 @@ class KXUTIL_API KXWString {
         return *this;
     }
 
-    bool operator==(const KXWString& other) const;
-    bool operator!=(const char16_t* text) const;
-    bool operator<(const KXWString& other) const;
+    // Comparisons allocate nothing, so they are inline: the field map compares on every
+    // field of every source.
+    bool operator==(const KXWString& other) const { return view() == other.view(); }
+    bool operator!=(const char16_t* text) const {
+        return view() != (text != nullptr ? std::u16string_view(text) : std::u16string_view());
+    }
+    bool operator<(const KXWString& other) const { return view() < other.view(); }
 
     // Position of the first occurrence at or after start; -1 when there is none.
     int32_t find(char16_t c, int32_t start = 0) const;
@@ -52,6 +70,9 @@ class KXUTIL_API KXWString {
     int32_t length() const { return length_; }
     const char16_t* c_str() const { return data_ != nullptr ? data_ : u""; }
     char16_t operator[](int32_t i) const { return data_[i]; }
+    std::u16string_view view() const {
+        return {c_str(), static_cast<std::u16string_view::size_type>(length_)};
+    }
 
     // Both answer false when the text did not convert without loss; the result is then
     // the converted form, with U+FFFD for what could not be converted.
