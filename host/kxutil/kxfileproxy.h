@@ -49,6 +49,33 @@ class KXUTIL_API KXFileProxy {
         }
         return wgetchSlow();
     }
+    // Reads characters until stop(c) answers true, and returns that character, which is
+    // consumed too; each character before it goes to take(c). kEndOfData when the data
+    // ends first. The same as a wgetch loop, but a byte source is walked with its place
+    // kept in registers, as the readers of every field need.
+    template <typename Stop, typename Take>
+    char16_t scan(Stop stop, Take take) {
+        for (;;) {
+            if (!hasPutBack_ && unitSize_ == 1 && bufferPos_ < bufferLength_) {
+                const unsigned char* const start = buffer_ + bufferPos_;
+                const unsigned char* const end = buffer_ + bufferLength_;
+                const unsigned char* p = start;
+                char16_t c = 0;
+                bool stopped = false;
+                while (p != end) {
+                    c = *p++;
+                    if ((stopped = stop(c))) break;
+                    take(c);
+                }
+                bufferPos_ = static_cast<int32_t>(p - buffer_);
+                lastPos_ = bufferStart_ + bufferPos_ - 1;
+                if (stopped) return c;
+            }
+            const char16_t c = wgetch();
+            if (c == kEndOfData || stop(c)) return c;
+            take(c);
+        }
+    }
     // The next wgetch, getch or read delivers c first.
     void wputBack(char16_t c) {
         putBack_ = c;

@@ -15,6 +15,7 @@ KXFIXDoc::~KXFIXDoc() {
 }
 
 bool KXFIXDoc::isFIXFile() {
+    peek_.valid = false;  // a new file, or the same one read anew
     setBufferSize(16384);
     const int32_t first = getch() & 0xFFFF;
     if (first == 0xFFFE) {
@@ -46,32 +47,52 @@ bool KXFIXDoc::isFIXFile() {
 
 int32_t KXFIXDoc::peekTag(KXWString& tag) {
     savedPos = tell();
-    tag.clear();
-    for (int32_t n = 0; n < kMaxTagLength; ++n) {
-        const char16_t c = wgetch();
-        if (c == kEquals || c == kEnd) break;
-        tag += c;
+    if (!peek_.valid || peek_.at != savedPos) {
+        peek_.valid = true;
+        peek_.at = savedPos;
+        peek_.sum = 0;
+        KXWString& text = peek_.tag;
+        text.clear();
+        int64_t& sum = peek_.sum;
+        const char16_t last = scan(
+            [&text](char16_t c) { return c == kEquals || text.length() == kMaxTagLength; },
+            [&text, &sum](char16_t c) {
+                text += c;
+                sum += c;
+            });
+        // Stopped by the length bound, the character read last is not the tag's.
+        peek_.foundEquals = last == kEquals && text.length() < kMaxTagLength;
+        if (peek_.foundEquals) sum += last;
+        peek_.after = tell();
+        seek(savedPos, 0);
     }
-    seek(savedPos, 0);
+    tag = peek_.tag;
     return tag.length();
 }
 
 int32_t KXFIXDoc::readValue(KXWString& value) {
     value.clear();
-    const char16_t separator = static_cast<unsigned char>(fieldSeparator);
     int64_t sum = 0;
-    bool seenEquals = false;
-    for (;;) {
-        const char16_t c = wgetch();
-        if (c == kEnd) break;
-        sum += c;
-        if (c == kEquals) {
-            seenEquals = true;
-        } else if (seenEquals) {
-            if (c == separator) break;
-            value += c;
+    const auto add = [&sum](char16_t c) { sum += c; };
+    if (peek_.valid && peek_.foundEquals && peek_.at == tell()) {
+        seek(peek_.after, 0);
+        sum = peek_.sum;
+    } else {
+        const char16_t equals = scan([](char16_t c) { return c == kEquals; }, add);
+        if (equals == kEnd) {
+            lastFieldSum_ = sum;
+            return 0;
         }
+        add(equals);
     }
+    // Every later "=" is dropped from the value, though it counts in the sum.
+    const char16_t separator = static_cast<unsigned char>(fieldSeparator);
+    const char16_t last = scan([separator](char16_t c) { return c == separator; },
+                               [&sum, &value](char16_t c) {
+                                   sum += c;
+                                   if (c != kEquals) value += c;
+                               });
+    if (last != kEnd) add(last);
     lastFieldSum_ = sum;
     return value.length();
 }
