@@ -43,7 +43,7 @@ void checkCheckSum(const KXWString& value, int64_t& checkTotal, KXValidator& val
 }  // namespace
 
 BATCHERR KXFIXValidator::parseFIXFile(FIXFieldMap& fieldMap, KXFIXDoc& doc, int64_t& checkTotal) {
-    SeenEntries seen;
+    TagIndex topLevel(fieldMap);
     int32_t fieldPosition = 0;
     while (doc.peekTag(fieldTag) > 0) {
         ++fieldPosition;
@@ -51,15 +51,14 @@ BATCHERR KXFIXValidator::parseFIXFile(FIXFieldMap& fieldMap, KXFIXDoc& doc, int6
             addError(KXVAL_OTHER_ERROR, KXWString(finding), sourceName, -1, -1);
             return BATCH_CHECK_FAILED;
         }
-        const auto entry = fieldMap.find(fieldTag);
-        if (entry == fieldMap.end()) {
+        const TagIndex::Entry* entry = topLevel.read(fieldTag);
+        if (entry == nullptr) {
             KXWString message(u"Failed to match tag=");
             message += fieldTag;
             message += u" in schema file";
             addError(KXVAL_OTHER_ERROR, message, sourceName, -1, -1);
             return BATCH_CHECK_FAILED;
         }
-        seen.insert(&*entry);
         const FIXField& definition = *entry->second;
         doc.readValue(fieldValue);
         if (isTag(fieldTag, u"10")) {
@@ -73,6 +72,6 @@ BATCHERR KXFIXValidator::parseFIXFile(FIXFieldMap& fieldMap, KXFIXDoc& doc, int6
         if (definition.getIsField() == 0)
             parseGroup(definition.getChildren(), doc, repetitionCount(fieldValue), checkTotal);
     }
-    reportMissingRequired(fieldMap, seen, *this, sourceName);
+    reportMissingRequired(fieldMap, topLevel, *this, sourceName);
     return BATCH_OK;
 }

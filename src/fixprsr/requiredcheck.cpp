@@ -22,7 +22,7 @@ std::unordered_set<const FIXField*> nestedGroups(const FIXFieldMap& fieldMap) {
 
 }  // namespace
 
-void reportMissingRequired(const FIXFieldMap& fieldMap, const SeenEntries& seen,
+void reportMissingRequired(const FIXFieldMap& fieldMap, const TagIndex& topLevel,
                            KXValidator& validator, const KXWString& file) {
     const std::unordered_set<const FIXField*> nested = nestedGroups(fieldMap);
     for (const auto& entry : fieldMap) {
@@ -30,8 +30,7 @@ void reportMissingRequired(const FIXFieldMap& fieldMap, const SeenEntries& seen,
         if (definition.getRequirement() != Required || nested.count(&definition) != 0) continue;
         const KXWString& tag = definition.getTag();
         const int32_t start = tagKeyStart(tag);
-        const auto key = fieldMap.find(tag.substr(start, tag.length() - start));
-        if (key != fieldMap.end() && seen.count(&*key) != 0) continue;
+        if (topLevel.wasRead(tag.substr(start, tag.length() - start))) continue;
         reportFieldFinding(validator, file, tag, kFieldMissing);
     }
 }
