@@ -1,12 +1,8 @@
 #include "fixprsr/fieldreport.h"
 
-#include <algorithm>
-
 bool matchesDefinitionTag(const KXWString& definitionTag, const KXWString& readTag) {
     const int32_t start = tagKeyStart(definitionTag);
-    const char16_t* key = definitionTag.c_str() + start;
-    return definitionTag.length() - start == readTag.length() &&
-           std::equal(key, key + readTag.length(), readTag.c_str());
+    return definitionTag.view().substr(start) == readTag.view();
 }
 
 void reportFieldFinding(KXValidator& validator, const KXWString& file, const KXWString& tag,

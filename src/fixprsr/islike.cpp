@@ -1,25 +1,21 @@
 #include <algorithm>
+#include <string_view>
 
 #include "fix/kxfixvalidator.h"
 
-namespace {
-
-bool equalsSpan(const KXWString& value, const char16_t* begin, int32_t length) {
-    return value.length() == length && std::equal(begin, begin + length, value.c_str());
-}
-
-}  // namespace
-
 // Walks the pattern by position instead of shortening a copy: it runs for every field
-// that has a pattern.
+// that has a pattern. The alternatives end at the first empty one, whose "|" then
+// belongs to the last alternative with the rest of the pattern.
 bool KXFIXValidator::isLike(const KXWString& value, const KXWString& pattern) {
-    const char16_t* text = pattern.c_str();
-    int32_t start = 0;
-    for (int32_t bar = pattern.find(u'|', start); bar > start; bar = pattern.find(u'|', start)) {
-        if (equalsSpan(value, text + start, bar - start)) return true;
+    const std::u16string_view wanted = value.view();
+    const char16_t* start = pattern.c_str();
+    const char16_t* const end = start + pattern.length();
+    for (;;) {
+        const char16_t* const bar = std::find(start, end, u'|');
+        if (bar == end || bar == start) return wanted == std::u16string_view(start, end - start);
+        if (wanted == std::u16string_view(start, bar - start)) return true;
         start = bar + 1;
     }
-    return equalsSpan(value, text + start, pattern.length() - start);
 }
 
 BATCHERR KXFIXValidator::checkValidField(const KXWString& pattern, const KXWString& value) {
