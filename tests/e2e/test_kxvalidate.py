@@ -1,10 +1,17 @@
 """End-to-end tests of kxvalidate on real files, through the real program and plug-in."""
 
+import io
 import json
 import os
+import re
 import subprocess
+import sys
 import tempfile
 import unittest
+
+ROOT = os.path.join(os.path.dirname(os.path.abspath(__file__)), "..", "..")
+sys.path.insert(0, os.path.join(ROOT, "bench"))
+import gen_corpus  # noqa: E402
 
 KXVALIDATE = os.environ.get("KXVALIDATE", "kxvalidate")
 SOH = "\x01"
@@ -165,7 +172,7 @@ class KxvalidateTest(unittest.TestCase):
         self.assertEqual(done.returncode, 0, done.stdout)
 
     def test_examples_with_the_bundled_schema(self):
-        examples = os.path.join(os.path.dirname(__file__), "..", "..", "examples")
+        examples = os.path.join(ROOT, "examples")
         clean = [os.path.join(examples, n) for n in ("orders.fix", "executions.fix")]
         self.assertEqual(self.run_cli(*clean, schema=False).returncode, 0)
         faults = os.path.join(examples, "faults.fix")
@@ -174,6 +181,27 @@ class KxvalidateTest(unittest.TestCase):
             "Field 54 failed to match specified value", "The Checksum is incorrect",
             "The Checksum length is incorrect", "The Checksum is incorrect",
             "Field 448 is missing", "Failed to match tag=9999 in schema file"])
+
+    def test_long_corpus_across_many_buffers(self):
+        # Fields straddle every buffer boundary; each Side edited to Z must be reported.
+        out = io.BytesIO()
+        gen_corpus.generate(out, size=600_000, seed=7)
+        clean = out.getvalue()
+        faulty, edits = re.subn(rb"\x0154=1\x01", b"\x0154=Z\x01", clean)
+        self.assertGreater(edits, 100)
+        side = ["Field 54 failed to match specified value"]
+        for name, data, unicode, expected in [
+            ("clean", clean, False, []),
+            ("faulty", faulty, False, side * edits),
+            ("utf16", b"\xff\xfe" + faulty.decode("latin-1").encode("utf-16-le"), True,
+             side * edits),
+        ]:
+            with self.subTest(name):
+                done, objects = self.json_lines(
+                    *(["-u"] if unicode else []), self.write(name + ".fix", data), schema=False)
+                found = [o["message"] for o in objects[:-1]]
+                # An edited Side also breaks its message's CheckSum.
+                self.assertEqual([m for m in found if "Checksum" not in m], expected)
 
 
 if __name__ == "__main__":
