@@ -1,6 +1,5 @@
 #include <gtest/gtest.h>
 
-#include <memory>
 #include <string>
 
 #include "fixprsr/kxfixdoc.h"
@@ -12,116 +11,74 @@ using testutil::fix;
 using testutil::TempFile;
 using testutil::utf16;
 
-struct DetectCase {
-    const char* name;
-    std::string bytes;
-    KX_CSET cset;
-    bool isFix;
-    char16_t next;  // character the reader stands on afterwards
-};
-
 TEST(KXFIXDoc, RecognisesFixFilesAfterMarksBlanksAndComments) {
     const std::string message = fix("8=FIX.4.4|9=5|35=0|10=000|");
-    const DetectCase cases[] = {
-        {"plain", message, KX_CSET_BYTE, true, u'8'},
-        {"blank and comment lines", "\r\n  \t\n; a comment\n;another\r\n\n" + message, KX_CSET_BYTE,
-         true, u'8'},
-        {"comment after blanks on one line", "   ; note\n" + message, KX_CSET_BYTE, true, u'8'},
-        {"utf-16 lsb with mark", "\xFF\xFE" + utf16("\r\n" + message, false), KX_CSET_UTF16, true,
-         u'8'},
-        {"utf-16 msb with mark", "\xFE\xFF" + utf16(";c\n" + message, true), KX_CSET_UTF16, true,
-         u'8'},
-        {"utf-16 without mark", utf16(message, false), KX_CSET_UTF16, true, u'8'},
-        {"starts with 9", fix("9=5|8=FIX.4.4|"), KX_CSET_BYTE, false, u'9'},
-        {"empty", "", KX_CSET_BYTE, false, KXFileProxy::kEndOfData},
-        {"only comments", "; one\n\n; two\n", KX_CSET_BYTE, false, KXFileProxy::kEndOfData},
-        {"comment without line feed", "; the end", KX_CSET_BYTE, false, KXFileProxy::kEndOfData},
-        {"single 8", "8", KX_CSET_BYTE, true, u'8'},
+    const struct {
+        std::string bytes;
+        KX_CSET cset;
+        bool isFix;
+        char16_t next;  // where the reader stands afterwards
+    } cases[] = {
+        {"\r\n   ; note\n;another\r\n\n" + message, KX_CSET_BYTE, true, u'8'},
+        {"\xFE\xFF" + utf16(";c\n" + message, true), KX_CSET_UTF16, true, u'8'},
+        {utf16(message, false), KX_CSET_UTF16, true, u'8'},  // LSB again after an MSB file
+        {fix("9=5|8=FIX.4.4|"), KX_CSET_BYTE, false, u'9'},
+        {"", KX_CSET_BYTE, false, KXFileProxy::kEndOfData},
+        {"; one\n\n; the end", KX_CSET_BYTE, false, KXFileProxy::kEndOfData},
+        {"8", KX_CSET_BYTE, true, u'8'},
     };
+    KXFIXDoc doc;
     for (const auto& c : cases) {
         TempFile file(c.bytes);
-        KXFIXDoc doc;
-        ASSERT_EQ(doc.openfile(file.c_str(), "rbu", c.cset), 0) << c.name;
-        EXPECT_EQ(doc.isFIXFile(), c.isFix) << c.name;
-        EXPECT_EQ(doc.wgetch(), c.next) << c.name;
+        ASSERT_EQ(doc.openfile(file.c_str(), "rbu", c.cset), 0) << c.bytes;
+        EXPECT_EQ(doc.isFIXFile(), c.isFix) << c.bytes;
+        EXPECT_EQ(doc.wgetch(), c.next) << c.bytes;
     }
 }
 
-TEST(KXFIXDoc, ByteOrderOfOneFileDoesNotLeakIntoTheNext) {
-    TempFile msb("\xFE\xFF" + utf16("8=", true));
-    TempFile lsb(utf16("8=", false));
+// Peeks, checking that the position stays put and that the count is the tag's length.
+std::u16string peek(KXFIXDoc& doc) {
+    KXWString tag(u"stale");
+    const int64_t at = doc.tell();
+    const int32_t n = doc.peekTag(tag);
+    EXPECT_EQ(n, tag.length());
+    EXPECT_EQ(doc.tell(), at);
+    return tag.c_str();
+}
+
+// Reads a value, checking the count and that the sum covers every character consumed.
+std::u16string value(KXFIXDoc& doc, const std::string& consumed) {
+    KXWString v(u"stale");
+    const int32_t n = doc.readValue(v);
+    EXPECT_EQ(n, v.length());
+    int64_t sum = 0;
+    for (const char c : consumed) sum += static_cast<unsigned char>(c);
+    EXPECT_EQ(doc.lastFieldSum(), sum);
+    return v.c_str();
+}
+
+TEST(KXFIXDoc, PeekLeavesThePositionAndReadConsumesTheField) {
+    TempFile file(fix("35=D|58=a=b|abc|35=D|x|9=1|=5|") + "\r\n8=");
     KXFIXDoc doc;
-    ASSERT_EQ(doc.openfile(msb.c_str(), "rbu", KX_CSET_UTF16), 0);
-    EXPECT_TRUE(doc.isFIXFile());
-    doc.close(false);
-    ASSERT_EQ(doc.openfile(lsb.c_str(), "rbu", KX_CSET_UTF16), 0);
-    EXPECT_TRUE(doc.isFIXFile());
-}
-
-class ReaderTest : public ::testing::Test {
-  protected:
-    void open(const std::string& bytes) {
-        file_ = std::make_unique<TempFile>(bytes);
-        ASSERT_EQ(doc_.openfile(file_->c_str(), "rbu", KX_CSET_BYTE), 0);
-    }
-    std::u16string peek() {
-        KXWString tag(u"stale");
-        const int32_t n = doc_.peekTag(tag);
-        EXPECT_EQ(n, tag.length());
-        return tag.c_str();
-    }
-    std::u16string value() {
-        KXWString v(u"stale");
-        const int32_t n = doc_.readValue(v);
-        EXPECT_EQ(n, v.length());
-        return v.c_str();
-    }
-
-    std::unique_ptr<TempFile> file_;
-    KXFIXDoc doc_;
-};
-
-TEST_F(ReaderTest, PeekLeavesThePositionAndReadConsumesTheField) {
-    open(fix("35=D|58=a=b|abc|35=D|") + "\r\n8=");
-    EXPECT_EQ(peek(), u"35");
-    EXPECT_EQ(peek(), u"35");
-    EXPECT_EQ(value(), u"D");
-    EXPECT_EQ(value(), u"ab");  // every "=" is dropped
-    EXPECT_EQ(peek(),
-              u"abc\x01"
-              u"35");          // separators belong to the tag
-    EXPECT_EQ(value(), u"D");  // a separator before any "=" does not end the field
-    EXPECT_EQ(peek(), u"\r\n8");
-    EXPECT_EQ(value(), u"");
-    EXPECT_EQ(peek(), u"");
-    EXPECT_EQ(value(), u"");
-}
-
-TEST_F(ReaderTest, FieldSumCoversEveryConsumedCharacter) {
-    open(fix("8=FIX.4.4|x=|"));
-    value();
-    int64_t expected = 0;
-    for (const char c : fix("8=FIX.4.4|")) expected += static_cast<unsigned char>(c);
-    EXPECT_EQ(doc_.lastFieldSum(), expected);
-    value();
-    EXPECT_EQ(doc_.lastFieldSum(), 'x' + '=' + 1);
-    value();
-    EXPECT_EQ(doc_.lastFieldSum(), 0);
-}
-
-TEST_F(ReaderTest, LongTagIsBoundedAndKeepsThePosition) {
-    open(std::string(100000, '7'));
-    const std::u16string tag = peek();
-    EXPECT_EQ(static_cast<int32_t>(tag.size()), KXFIXDoc::kMaxTagLength);
-    EXPECT_EQ(doc_.tell(), 0);
-    EXPECT_EQ(value(), u"");
-    EXPECT_EQ(doc_.lastFieldSum(), 100000 * int64_t{'7'});
-}
-
-TEST_F(ReaderTest, FieldStartingWithEqualsHasAnEmptyTag) {
-    open(fix("=5|"));
-    EXPECT_EQ(peek(), u"");
-    EXPECT_EQ(doc_.tell(), 0);
+    ASSERT_EQ(doc.openfile(file.c_str(), "rbu", KX_CSET_BYTE), 0);
+    EXPECT_EQ(peek(doc), u"35");
+    EXPECT_EQ(peek(doc), u"35");
+    EXPECT_EQ(value(doc, fix("35=D|")), u"D");
+    EXPECT_EQ(value(doc, fix("58=a=b|")), u"ab");   // every "=" is dropped
+    EXPECT_EQ(peek(doc), u"abc\00135");             // separators belong to the tag
+    EXPECT_EQ(value(doc, fix("abc|35=D|")), u"D");  // and end no field before its "="
+    EXPECT_EQ(value(doc, fix("x|9=1|")), u"1");     // not even when it was not peeked at
+    EXPECT_EQ(peek(doc), u"");                      // a field starting with "="
+    EXPECT_EQ(value(doc, fix("=5|")), u"5");
+    EXPECT_EQ(peek(doc), u"\r\n8");
+    EXPECT_EQ(value(doc, "\r\n8="), u"");
+    EXPECT_EQ(peek(doc), u"");
+    EXPECT_EQ(value(doc, ""), u"");
+    const std::string sevens(100000, '7');
+    TempFile noEquals(sevens);
+    ASSERT_EQ(doc.openfile(noEquals.c_str(), "rbu", KX_CSET_BYTE), 0);
+    EXPECT_EQ(peek(doc), std::u16string(KXFIXDoc::kMaxTagLength, u'7'));  // bounded
+    EXPECT_EQ(value(doc, sevens), u"");
 }
 
 }  // namespace
