@@ -47,26 +47,21 @@ bool KXFIXDoc::isFIXFile() {
 
 int32_t KXFIXDoc::peekTag(KXWString& tag) {
     savedPos = tell();
-    if (!peek_.valid || peek_.at != savedPos) {
-        peek_.valid = true;
-        peek_.at = savedPos;
-        peek_.sum = 0;
-        KXWString& text = peek_.tag;
-        text.clear();
-        int64_t& sum = peek_.sum;
-        const char16_t last = scan(
-            [&text](char16_t c) { return c == kEquals || text.length() == kMaxTagLength; },
-            [&text, &sum](char16_t c) {
-                text += c;
-                sum += c;
-            });
-        // Stopped by the length bound, the character read last is not the tag's.
-        peek_.foundEquals = last == kEquals && text.length() < kMaxTagLength;
-        if (peek_.foundEquals) sum += last;
-        peek_.after = tell();
-        seek(savedPos, 0);
-    }
-    tag = peek_.tag;
+    tag.clear();
+    int64_t sum = 0;
+    const char16_t last = scan(
+        [&tag](char16_t c) { return c == kEquals || tag.length() == kMaxTagLength; },
+        [&tag, &sum](char16_t c) {
+            tag += c;
+            sum += c;
+        });
+    // Stopped by the length bound, the character read last is not the tag's.
+    peek_.foundEquals = last == kEquals && tag.length() < kMaxTagLength;
+    peek_.valid = true;
+    peek_.at = savedPos;
+    peek_.after = tell();
+    peek_.sum = peek_.foundEquals ? sum + last : sum;
+    seek(savedPos, 0);
     return tag.length();
 }
 

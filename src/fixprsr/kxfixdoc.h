@@ -29,15 +29,14 @@ class KXVFIX_API KXFIXDoc : public KXFileProxy {
     int64_t lastFieldSum() const { return lastFieldSum_; }
 
   private:
-    // What the last peekTag read, so that peeking again at the same place, and reading
-    // the field that was peeked at, do not read its tag again. Valid from isFIXFile on.
+    // Where the last peekTag found its field, so that reading the field that was peeked
+    // at does not read its tag again. Valid from isFIXFile on.
     struct Peek {
         bool valid = false;
         bool foundEquals = false;
         int64_t at = 0;     // where the tag starts
         int64_t after = 0;  // just past its "="
         int64_t sum = 0;    // codes of the tag and its "="
-        KXWString tag;
     };
 
     int64_t savedPos = 0;
