@@ -30,9 +30,15 @@ void FIXField::detachChildren(std::vector<FIXField*>& out) {
 }
 
 FIXField* FIXField::addChild(FIXField* child) {
-    if (children == nullptr) {
-        children = new (std::nothrow) FIXFieldList;
-        if (children == nullptr) return nullptr;
+    if (children != nullptr) return children->append(child);
+    // The list exists only once it holds a child, so a failure changes nothing.
+    auto* list = new (std::nothrow) FIXFieldList;
+    if (list == nullptr) return nullptr;
+    FIXField* added = list->append(child);
+    if (added == nullptr) {
+        delete list;
+        return nullptr;
     }
-    return children->append(child);
+    children = list;
+    return added;
 }
