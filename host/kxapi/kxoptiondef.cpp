@@ -20,5 +20,7 @@ KXOptionDef::KXOptionDef(const char16_t* name, const char16_t* alternateName,
 KXOptionDef::~KXOptionDef() = default;
 
 bool KXOptionDef::isNamed(const char16_t* name) const {
-    return name != nullptr && (!(name_ != name) || !(alternateName_ != name));
+    // An empty name names nothing, also when an option has no alternate name.
+    if (name == nullptr || name[0] == 0) return false;
+    return !(name_ != name) || !(alternateName_ != name);
 }

@@ -25,7 +25,7 @@ struct ToyValidator : KXValidator {
                 return BATCH_OK;
             },
             nullptr, 0, nullptr, nullptr, 65535, 1);
-        static const KXOptionDef muteDef(u"Mute", u"Mute", u"", 0, "", u"", nullptr, nullptr,
+        static const KXOptionDef muteDef(u"Mute", u"", u"", 0, "", u"", nullptr, nullptr,
                                          nullptr, nullptr, nullptr, 0, nullptr, nullptr, 65535, 1);
         static const KXOptionDef* const defs[] = {&pathDef, &muteDef, nullptr};
         return defs;
@@ -48,6 +48,7 @@ TEST(KXValidator, OptionsAreFoundByEitherExactNameAndLoadedFromLines) {
         EXPECT_EQ(v.SetOption(name, u"1"), BATCH_UNKNOWN_OPTION);
         EXPECT_EQ(v.GetOption(name, value), BATCH_UNKNOWN_OPTION);  // Mute: no callbacks
     }
+    EXPECT_EQ(v.FindOptionDef(u""), nullptr);  // though Mute has no alternate name
     EXPECT_EQ(KXValidator().SetOption(u"path", u"x"), BATCH_UNKNOWN_OPTION);
     KXString text("not an option line\npath=/x.xml\nunknown=1\nPath=/y.xml\r\n");
     v.LoadOptions(text);
