@@ -14,8 +14,17 @@ KXFIXDoc::~KXFIXDoc() {
     close(false);
 }
 
+int32_t KXFIXDoc::openfile(const char16_t* path, const char* mode, KX_CSET cset) {
+    peek_.valid = false;
+    return KXFileProxy::openfile(path, mode, cset);
+}
+
+int32_t KXFIXDoc::openfile(const char* path, const char* mode, KX_CSET cset) {
+    peek_.valid = false;
+    return KXFileProxy::openfile(path, mode, cset);
+}
+
 bool KXFIXDoc::isFIXFile() {
-    peek_.valid = false;  // a new file, or the same one read anew
     setBufferSize(16384);
     const int32_t first = getch() & 0xFFFF;
     if (first == 0xFFFE) {

@@ -18,6 +18,9 @@ class KXVFIX_API KXFIXDoc : public KXFileProxy {
     KXFIXDoc& operator=(const KXFIXDoc& other) = default;
     ~KXFIXDoc() override;
 
+    // As the file proxy's, and a new file forgets where the last peek was.
+    int32_t openfile(const char16_t* path, const char* mode, KX_CSET cset);
+    int32_t openfile(const char* path, const char* mode, KX_CSET cset);
     // After an optional byte-order mark and blank or ";" comment lines, the file starts
     // with "8". The reader is left on that first significant character.
     bool isFIXFile();
@@ -30,7 +33,7 @@ class KXVFIX_API KXFIXDoc : public KXFileProxy {
 
   private:
     // Where the last peekTag found its field, so that reading the field that was peeked
-    // at does not read its tag again. Valid from isFIXFile on.
+    // at does not read its tag again. Forgotten whenever a file is opened.
     struct Peek {
         bool valid = false;
         bool foundEquals = false;

@@ -79,6 +79,12 @@ TEST(KXFIXDoc, PeekLeavesThePositionAndReadConsumesTheField) {
     ASSERT_EQ(doc.openfile(noEquals.c_str(), "rbu", KX_CSET_BYTE), 0);
     EXPECT_EQ(peek(doc), std::u16string(KXFIXDoc::kMaxTagLength, u'7'));  // bounded
     EXPECT_EQ(value(doc, sevens), u"");
+    // Opening a file forgets where the last peek was.
+    ASSERT_EQ(doc.openfile(file.c_str(), "rbu", KX_CSET_BYTE), 0);
+    EXPECT_EQ(peek(doc), u"35");
+    TempFile other(fix("9999=X|"));
+    ASSERT_EQ(doc.openfile(other.c_str(), "rbu", KX_CSET_BYTE), 0);
+    EXPECT_EQ(value(doc, fix("9999=X|")), u"X");
 }
 
 }  // namespace
