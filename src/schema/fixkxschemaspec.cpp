@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <string_view>
 
 #include "kxutil/kxglob.h"
 #include "kxutil/kxxmlutils.h"
@@ -42,16 +43,16 @@ bool isRemote(const XMLCh* systemId) {
     return scheme != u"file" && scheme != u"FILE";
 }
 
-bool isNamed(const KXWString& name, const char16_t* text) {
-    return !(name != text);
+bool isNamed(const KXWString& name, std::u16string_view text) {
+    return name.view() == text;
 }
 
 bool isHeaderElement(const KXWString& name) {
-    static constexpr const char16_t* kHeader[] = {
+    static constexpr std::u16string_view kHeader[] = {
         u"Title",        u"Subject",      u"AuthorName",   u"TradingPartner", u"Version",
         u"CreationDate", u"LastModified", u"IndustryType", u"Standard",       u"StdVersion"};
     return std::any_of(std::begin(kHeader), std::end(kHeader),
-                       [&name](const char16_t* h) { return isNamed(name, h); });
+                       [&name](std::u16string_view h) { return isNamed(name, h); });
 }
 
 }  // namespace
@@ -84,9 +85,7 @@ void FIXKXSchemaSpec::setDocumentLocator(const xercesc::Locator* documentLocator
 
 void FIXKXSchemaSpec::characters(const XMLCh* chars, XMLSize_t /*length*/) {
     // The parser may split one element's text into several chunks: keep them all.
-    KXWString chunk;
-    KXXmlUtils::XMLChToWchar(chars, chunk, false);
-    text += chunk;
+    text += chars;
 }
 
 void FIXKXSchemaSpec::startElement(const XMLCh* name, xercesc::AttributeList& /*attributes*/) {
