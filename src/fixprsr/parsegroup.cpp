@@ -43,5 +43,6 @@ BATCHERR KXFIXValidator::parseGroup(FIXFieldList* fields, KXFIXDoc& doc, int rep
             if (count > 0) groupLevels.push_back({member.getChildren(), count, 1, false});
         }
     }
+    groupLevels.clear();  // its entries point into a schema that lives only for this call
     return BATCH_OK;
 }
