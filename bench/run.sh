@@ -23,23 +23,31 @@ cmake --build "$build" -j "$(nproc)" >/dev/null
 corpus=$work/corpus-${size_mib}MiB.fix
 [ -f "$corpus" ] || python3 bench/gen_corpus.py --size $((size_mib * 1048576)) -o "$corpus"
 bytes=$(stat -c %s "$corpus")
-separators=$("$build/bin/readlimit" "$corpus")
-messages=$(grep -c -a -o "$(printf '\00110=')" "$corpus" || true)
+"$build/bin/readlimit" "$corpus" >/dev/null  # warms the page cache
+messages=$(python3 -c 'import sys; print(open(sys.argv[1], "rb").read().count(b"\x0110="))' "$corpus")
 
-# Median wall time in seconds of a command over the runs; the command's output is dropped.
-median() {
-  for i in $(seq "$runs"); do
-    /usr/bin/time -f "%e %M" -o "$work/time" "$@" >/dev/null 2>&1 || true
-    cat "$work/time"
-  done | sort -n | awk '{ t[NR] = $1; m[NR] = $2 } END { i = int((NR + 1) / 2); print t[i], m[i] }'
+# The machine is shared and its speed drifts, so each round times every program once, one
+# after another, and each program's figure is its median over the rounds.
+timed() {  # label, command...: appends "label seconds KiB" to the round log
+  label=$1; shift
+  /usr/bin/time -f "$label %e %M" -a -o "$work/rounds" "$@" >/dev/null 2>&1 || true
 }
-
-set -- $(median "$build/bin/readlimit" "$corpus"); read_s=$1
-set -- $(median "$build/bin/kxvalidate" -q "$corpus"); kx_s=$1; kx_rss=$2
-peer_s=""
-if [ -x "$build/bin/peer_validate" ]; then
-  set -- $(median "$build/bin/peer_validate" tools/dictionaries/FIX44.xml "$corpus"); peer_s=$1
-fi
+: >"$work/rounds"
+peer=""
+[ -x "$build/bin/peer_validate" ] && peer="$build/bin/peer_validate"
+for i in $(seq "$runs"); do
+  timed read "$build/bin/readlimit" "$corpus"
+  timed kx "$build/bin/kxvalidate" -q "$corpus"
+  [ -n "$peer" ] && timed peer "$peer" tools/dictionaries/FIX44.xml "$corpus"
+done
+median() {  # label, column: the median of that column over the label's rounds
+  awk -v l="$1" -v c="$2" '$1 == l { print $c }' "$work/rounds" | sort -n |
+    awk '{ v[NR] = $1 } END { if (NR) print v[int((NR + 1) / 2)] }'
+}
+read_s=$(median read 2)
+kx_s=$(median kx 2)
+kx_rss=$(median kx 3)
+peer_s=$(median peer 2)
 schema_ms=$("$build/bin/schema_load_bench" schemas/FIX44.xml | awk '/median/ { print $(NF-1) }')
 
 report() {
