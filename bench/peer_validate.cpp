@@ -20,7 +20,10 @@ int main(int argc, char** argv) {
     size_t invalid = 0;
     // A message ends with the separator after "10=" and its value.
     for (size_t start = 0; start < data.size();) {
-        const size_t checksum = data.find("\x01" "10=", start);
+        const size_t checksum = data.find(
+            "\x01"
+            "10=",
+            start);
         if (checksum == std::string::npos) break;
         const size_t end = data.find('\x01', checksum + 4);
         if (end == std::string::npos) break;

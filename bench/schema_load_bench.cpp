@@ -34,7 +34,7 @@ int main(int argc, char** argv) {
         ms.push_back(took.count());
     }
     std::sort(ms.begin(), ms.end());
-    std::printf("%s: %zu map entries, %d runs, min %.2f ms, median %.2f ms\n", argv[1], nodes,
-                runs, ms.front(), ms[ms.size() / 2]);
+    std::printf("%s: %zu map entries, %d runs, min %.2f ms, median %.2f ms\n", argv[1], nodes, runs,
+                ms.front(), ms[ms.size() / 2]);
     return 0;
 }

@@ -58,12 +58,12 @@ int32_t KXFIXDoc::peekTag(KXWString& tag) {
     savedPos = tell();
     tag.clear();
     int64_t sum = 0;
-    const char16_t last = scan(
-        [&tag](char16_t c) { return c == kEquals || tag.length() == kMaxTagLength; },
-        [&tag, &sum](char16_t c) {
-            tag += c;
-            sum += c;
-        });
+    const char16_t last =
+        scan([&tag](char16_t c) { return c == kEquals || tag.length() == kMaxTagLength; },
+             [&tag, &sum](char16_t c) {
+                 tag += c;
+                 sum += c;
+             });
     // Stopped by the length bound, the character read last is not the tag's.
     peek_.foundEquals = last == kEquals && tag.length() < kMaxTagLength;
     peek_.valid = true;

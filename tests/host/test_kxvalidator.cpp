@@ -25,8 +25,8 @@ struct ToyValidator : KXValidator {
                 return BATCH_OK;
             },
             nullptr, 0, nullptr, nullptr, 65535, 1);
-        static const KXOptionDef muteDef(u"Mute", u"", u"", 0, "", u"", nullptr, nullptr,
-                                         nullptr, nullptr, nullptr, 0, nullptr, nullptr, 65535, 1);
+        static const KXOptionDef muteDef(u"Mute", u"", u"", 0, "", u"", nullptr, nullptr, nullptr,
+                                         nullptr, nullptr, 0, nullptr, nullptr, 65535, 1);
         static const KXOptionDef* const defs[] = {&pathDef, &muteDef, nullptr};
         return defs;
     }
