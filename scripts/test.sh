@@ -1,6 +1,7 @@
 #!/bin/sh
 # Installs what is missing, then builds and runs the whole suite twice: a release build,
-# and one under AddressSanitizer and UndefinedBehaviorSanitizer.
+# and one under AddressSanitizer and UndefinedBehaviorSanitizer. Last, the test of
+# validators running side by side runs under ThreadSanitizer.
 set -eu
 cd "$(dirname "$0")/.."
 ./scripts/install-deps.sh
@@ -16,3 +17,7 @@ for config in release sanitize; do
   cmake --build "$dir" -j "$jobs"
   ctest --test-dir "$dir" -j "$jobs" --output-on-failure
 done
+echo "== thread"
+cmake -S . -B build-tsan -DCMAKE_BUILD_TYPE=RelWithDebInfo -DKXVFIX_TSAN=ON >/dev/null
+cmake --build build-tsan -j "$jobs" --target plugin_tests
+TSAN_OPTIONS=halt_on_error=1 ctest --test-dir build-tsan -R '^Threads\.' --output-on-failure
