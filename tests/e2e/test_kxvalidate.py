@@ -203,6 +203,31 @@ class KxvalidateTest(unittest.TestCase):
                 # An edited Side also breaks its message's CheckSum.
                 self.assertEqual([m for m in found if "Checksum" not in m], expected)
 
+    def test_hostile_sources_and_schemas(self):
+        # Each gets a clear answer, in bounded time and memory; none may crash the program.
+        gib = self.write("gib.fix", "8")
+        os.truncate(gib, 1 << 30)  # sparse: a 1 GiB tag without "=" after the "8"
+        endless = self.write("endless.fix", "8=")
+        os.truncate(endless, 16 << 20)  # a BeginString value with no separator to end it
+        nuls = self.write("nul.fix", ORDER.replace("11=ABC", "11=A\x00C"))
+        cut = self.write("cut.fix", ORDER[:-3])  # inside the CheckSum value
+        odd = self.write("odd.fix", b"\xff\xfe" + ORDER.encode("utf-16-le") + b"8")
+        cases = [  # arguments, exit status, first line of the output
+            ([self.dir.name], 2, f"{self.dir.name}: error: Unable to open source file!"),
+            (["/dev/null"], 2, "/dev/null: error: Source file is not a FIX file!"),
+            (["-s", self.dir.name, cut], 2, f"{self.dir.name}: error: Not a valid schema spec file!"),
+            (["-s", "/dev/null", cut], 2, "/dev/null: error: Not a valid schema spec file!"),
+            ([gib], 1, f"{gib}: error: Failed to find BeginString"),
+            ([endless], 1, f"{endless}: field error: Field 8 failed to match specified value"),
+            ([nuls], 1, f"{nuls}: error: The Checksum is incorrect"),
+            ([cut], 1, f"{cut}: error: The Checksum length is incorrect"),
+            (["-u", odd], 0, "kxvalidate: 1 file, 0 findings, 0 not validated"),
+        ]
+        for args, status, first in cases:
+            with self.subTest(args=args):
+                done = self.run_cli(*args)
+                self.assertEqual((done.returncode, done.stdout.splitlines()[0]), (status, first))
+
 
 if __name__ == "__main__":
     unittest.main()
