@@ -28,6 +28,14 @@ void logException(int32_t level, const char* format, const xercesc::SAXParseExce
                   e.getSystemId(), e.getMessage());
 }
 
+// Each node's qualified tag spells its whole group path, so deep nesting costs memory in
+// the square of the depth. FIX nests a few levels; far deeper is refused.
+constexpr int32_t kMaxGroupDepth = 100;
+constexpr char16_t kNestingRefused[] = u"Groups nested deeper than 100 are refused";
+
+// Ends the parse from inside a callback; the load answers false.
+struct NestingRefused {};
+
 constexpr const char* kWarning = "Browser: Warning: At line %d, column %d of file %s: %s";
 constexpr const char* kError = "Browser: Error: At line %d, column %d of file %s: %s";
 constexpr const char* kFatal = "Browser: Fatal: At line %d, column %d of file %s: %s";
@@ -69,14 +77,23 @@ FIXKXSchemaSpec::~FIXKXSchemaSpec() {
 xercesc::InputSource* FIXKXSchemaSpec::resolveEntity(const XMLCh* /*publicId*/,
                                                      const XMLCh* systemId) {
     if (!isRemote(systemId)) return nullptr;
-    errorFlag = true;
     KXWString message(u"External entity not fetched, only local files are read: ");
     message += systemId;
-    logDiagnostic(8, kFatal, locator != nullptr ? clampToInt32(locator->getLineNumber()) : 0,
-                  locator != nullptr ? clampToInt32(locator->getColumnNumber()) : 0,
-                  locator != nullptr ? locator->getSystemId() : nullptr, message.c_str());
+    refuse(message.c_str());
     static const XMLByte kNothing[] = {0};
     return new xercesc::MemBufInputSource(kNothing, 0, systemId);
+}
+
+void FIXKXSchemaSpec::refuseNesting() {
+    refuse(kNestingRefused);
+    throw NestingRefused();
+}
+
+void FIXKXSchemaSpec::refuse(const char16_t* message) {
+    errorFlag = true;
+    logDiagnostic(8, kFatal, locator != nullptr ? clampToInt32(locator->getLineNumber()) : 0,
+                  locator != nullptr ? clampToInt32(locator->getColumnNumber()) : 0,
+                  locator != nullptr ? locator->getSystemId() : nullptr, message);
 }
 
 void FIXKXSchemaSpec::setDocumentLocator(const xercesc::Locator* documentLocator) {
@@ -95,7 +112,7 @@ void FIXKXSchemaSpec::startElement(const XMLCh* name, xercesc::AttributeList& /*
         ++fieldDepth;
         handleElement(0);
     } else if (isNamed(elementName, u"Group")) {
-        ++groupDepth;
+        if (++groupDepth > kMaxGroupDepth) refuseNesting();
         handleElement(9);
     } else if (isNamed(elementName, u"Sequence")) {
         ++sequenceDepth;

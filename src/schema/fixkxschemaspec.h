@@ -43,6 +43,9 @@ class FIXKXSchemaSpec : public xercesc::HandlerBase {
   private:
     friend bool loadSchema(FIXKXSchemaSpec& handler, const char* path);
 
+    // A fatal diagnostic of the reader's own, at the parser's position; fails the load.
+    void refuse(const char16_t* message);
+    [[noreturn]] void refuseNesting();
     void applyTag();
     void applyRequirement();
     void beginGroup();

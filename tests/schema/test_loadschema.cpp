@@ -171,6 +171,24 @@ TEST(SchemaReader, MisplacedElementsNeitherLeakNorDoubleFree) {
     }
 }
 
+TEST(SchemaReader, WideSchemasLoadAndDeepOnesAreRefused) {
+    std::string wide, deep;
+    for (int i = 1; i <= 100000; ++i) {
+        wide += "<Field><Tag>" + std::to_string(i) + "</Tag></Field>";
+        deep += "<Group><Field><Tag>" + std::to_string(i) + "</Tag></Field><Sequence>";
+    }
+    LoadedText flat(fields(wide));
+    EXPECT_TRUE(flat.ok && flat.log.empty());
+    EXPECT_EQ(flat.spec.getFieldMap().size(), 100000U);
+    for (int i = 0; i < 100000; ++i) deep += "</Sequence></Group>";
+    LoadedText nested(fields(deep));
+    EXPECT_FALSE(nested.ok);
+    ASSERT_EQ(nested.log.size(), 1U);
+    EXPECT_NE(nested.log[0].find("Browser: Fatal: At line 1, column "), std::string::npos);
+    EXPECT_NE(nested.log[0].find("Groups nested deeper than 100 are refused"), std::string::npos);
+    EXPECT_EQ(nested.spec.getFieldMap().size(), 100U);  // what was built is kept, and freed
+}
+
 TEST(SchemaReader, LoadsTheBundledSchema) {
     Loaded s(KXVFIX_SOURCE_DIR "/schemas/FIX44.xml");
     ASSERT_TRUE(s.ok && s.log.empty());
