@@ -13,8 +13,8 @@
 
 namespace {
 
-// Bounds the work entity expansion may cause ("billion laughs").
-constexpr XMLSize_t kEntityExpansionLimit = 100000;
+// Bounds the work entity expansion may cause ("billion laughs"); a schema needs few.
+constexpr XMLSize_t kEntityExpansionLimit = 10000;
 
 }  // namespace
 

@@ -228,6 +228,16 @@ class KxvalidateTest(unittest.TestCase):
                 done = self.run_cli(*args)
                 self.assertEqual((done.returncode, done.stdout.splitlines()[0]), (status, first))
 
+    def test_entity_expansion_is_bounded(self):
+        entities = '<!ENTITY a0 "lol">' + "".join(
+            f'<!ENTITY a{i} "{f"&a{i - 1};" * 10}">' for i in range(1, 10))
+        laughs = self.write("laughs.xml", f"<!DOCTYPE S [{entities}]><S><Transaction><Field>"
+                            "<Tag>8</Tag><Value>&a9;</Value></Field></Transaction></S>")
+        done = self.run_cli("-s", laughs, self.write("o.fix", ORDER), schema=False)
+        self.assertEqual(done.returncode, 2)
+        self.assertIn("entity expansions", done.stderr)
+        self.assertEqual(done.stdout.splitlines()[0], f"{laughs}: error: Not a valid schema spec file!")
+
 
 if __name__ == "__main__":
     unittest.main()
