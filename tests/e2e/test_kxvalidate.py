@@ -228,6 +228,17 @@ class KxvalidateTest(unittest.TestCase):
                 done = self.run_cli(*args)
                 self.assertEqual((done.returncode, done.stdout.splitlines()[0]), (status, first))
 
+    @unittest.skipIf(os.geteuid() == 0, "the superuser reads files without read permission")
+    def test_unreadable_source_and_schema(self):
+        source = self.write("locked.fix", ORDER)
+        os.chmod(source, 0)
+        os.chmod(self.schema, 0)
+        self.assertEqual(self.run_cli(source).stdout.splitlines()[0],
+                         f"{self.schema}: error: Not a valid schema spec file!")
+        os.chmod(self.schema, 0o644)
+        self.assertEqual(self.run_cli(source).stdout.splitlines()[0],
+                         f"{source}: error: Unable to open source file!")
+
     def test_entity_expansion_is_bounded(self):
         entities = '<!ENTITY a0 "lol">' + "".join(
             f'<!ENTITY a{i} "{f"&a{i - 1};" * 10}">' for i in range(1, 10))
