@@ -1,7 +1,7 @@
 #!/bin/sh
 # Installs everything the build and the tests need on Debian 12. Idempotent.
 set -eu
-PACKAGES="build-essential cmake pkg-config python3 time libgtest-dev libgmock-dev libxerces-c-dev libmimalloc-dev"
+PACKAGES="build-essential cmake pkg-config python3 time libgtest-dev libgmock-dev libxerces-c-dev libmimalloc-dev clang libclang-rt-14-dev"
 missing=""
 for p in $PACKAGES; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q "install ok installed" || missing="$missing $p"
