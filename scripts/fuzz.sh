@@ -4,6 +4,7 @@
 # Leaks the XML library makes itself are suppressed by fuzz/lsan.supp, each with its reason.
 set -eu
 cd "$(dirname "$0")/.."
+./scripts/install-deps.sh
 seconds=${1:-60}
 dir=build-fuzz
 targets="fuzz_walk fuzz_schema fuzz_validate"
