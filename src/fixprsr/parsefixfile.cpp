@@ -67,7 +67,8 @@ BATCHERR KXFIXValidator::parseFIXFile(FIXFieldMap& fieldMap, KXFIXDoc& doc, int6
             if (isTag(fieldTag, u"8")) checkTotal = 0;
             checkTotal += doc.lastFieldSum();
         }
-        if (definition.getValue().length() > 0 && !isLike(fieldValue, definition.getValue()))
+        if (definition.getValue().length() > 0 &&
+            !definition.getPattern().matches(fieldValue.view()))
             reportFieldFinding(*this, sourceName, definition.getTag(), kFieldMismatch);
         if (definition.getIsField() == 0)
             parseGroup(definition.getChildren(), doc, repetitionCount(fieldValue), checkTotal);

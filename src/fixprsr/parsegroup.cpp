@@ -36,7 +36,7 @@ BATCHERR KXFIXValidator::parseGroup(FIXFieldList* fields, KXFIXDoc& doc, int rep
         doc.readValue(fieldValue);
         checkTotal += doc.lastFieldSum();
         level.readAny = true;
-        if (member.getValue().length() > 0 && !isLike(fieldValue, member.getValue()))
+        if (member.getValue().length() > 0 && !member.getPattern().matches(fieldValue.view()))
             reportFieldFinding(*this, sourceName, member.getTag(), kFieldMismatch);
         if (member.getIsField() == 0) {
             const int count = repetitionCount(fieldValue);

@@ -8,6 +8,7 @@
 
 #include "kxutil/kxwstring.h"
 #include "kxvfixexport.h"
+#include "schema/valuepattern.h"
 
 class FIXFieldList;
 
@@ -33,7 +34,12 @@ class KXVFIX_API FIXField {
     const KXWString& getFormat() const { return format; }
     void setFormat(const KXWString& t) { format = t; }
     const KXWString& getValue() const { return value; }
-    void setValue(const KXWString& t) { value = t; }
+    void setValue(const KXWString& t) {
+        value = t;
+        pattern.assign(value.view());
+    }
+    // The value pattern, ready for matching.
+    const ValuePattern& getPattern() const { return pattern; }
     int32_t getRequirement() const { return requirement; }
     void setRequirement(int32_t r) { requirement = r; }
     int32_t getIsField() const { return isField; }
@@ -53,6 +59,7 @@ class KXVFIX_API FIXField {
     KXWString name;
     KXWString format;
     KXWString value;
+    ValuePattern pattern;  // views into value
     // A node whose schema entry has no Requirement is optional, as any unrecognised
     // requirement text is.
     int32_t requirement = Optional;

@@ -18,6 +18,8 @@ TEST(IsLike, AlternativesSplitAtBarsUntilOneStartsTheRest) {
         {"A||B", {"A", "|B"}, {"B", ""}},
         {"A|", {"A", ""}, {"|"}},
         {"", {""}, {"A"}},
+        // Single characters, ASCII or not, longer alternatives and repeats alike.
+        {"\xE9|AB|A|AB|Z|~", {"\xE9", "AB", "A", "Z", "~"}, {"B", "ABC", "e", "|", "AB|A"}},
     };
     Session s;
     for (const auto& [pattern, matching, failing] : cases) {
