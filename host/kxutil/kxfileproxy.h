@@ -76,6 +76,19 @@ class KXUTIL_API KXFileProxy {
             take(c);
         }
     }
+    // The bytes a byte source delivers next without refilling, for readers that take a
+    // run of them in one go: their count, and where they start. None when the next
+    // character must come through wgetch (UTF-16, a character given back, the buffer
+    // used up); skipBuffered then consumes what was taken.
+    int32_t buffered(const unsigned char*& bytes) const {
+        if (hasPutBack_ || unitSize_ != 1) return 0;
+        bytes = buffer_ + bufferPos_;
+        return bufferLength_ - bufferPos_;
+    }
+    void skipBuffered(int32_t count) {
+        bufferPos_ += count;
+        lastPos_ = bufferStart_ + bufferPos_ - 1;
+    }
     // The next wgetch, getch or read delivers c first.
     void wputBack(char16_t c) {
         putBack_ = c;

@@ -45,6 +45,16 @@ class KXUTIL_API KXWString {
         return *this;
     }
 
+    // Appends the characters fill writes into room for `room` of them; fill answers how
+    // many it wrote. For readers that copy a run in one pass.
+    template <typename Fill>
+    KXWString& appendRun(int32_t room, Fill fill) {
+        if (length_ + room >= capacity_) reserve(length_ + room);
+        length_ += fill(data_ + length_);
+        data_[length_] = 0;
+        return *this;
+    }
+
     // Comparisons allocate nothing, so they are inline: the field map compares on every
     // field of every source.
     bool operator==(const KXWString& other) const { return view() == other.view(); }

@@ -1,5 +1,6 @@
 #include "fixprsr/kxfixdoc.h"
 
+#include <algorithm>
 #include <cwctype>
 
 namespace {
@@ -7,6 +8,8 @@ namespace {
 constexpr char16_t kEnd = KXFileProxy::kEndOfData;
 constexpr char16_t kEquals = u'=';
 constexpr int32_t kSniffLength = 5;
+// Characters of a value copied in one pass.
+constexpr int32_t kValueRun = 1024;
 
 }  // namespace
 
@@ -57,6 +60,30 @@ bool KXFIXDoc::isFIXFile() {
 int32_t KXFIXDoc::peekTag(KXWString& tag) {
     savedPos = tell();
     tag.clear();
+    peek_.valid = true;
+    peek_.at = savedPos;
+    // Most tags lie whole in the buffer: they are copied from there, nothing consumed.
+    const unsigned char* bytes = nullptr;
+    const int32_t available = std::min(buffered(bytes), kMaxTagLength);
+    bool found = false;
+    int64_t runSum = kEquals;
+    tag.appendRun(kMaxTagLength, [bytes, available, &found, &runSum](char16_t* out) {
+        int32_t length = 0;
+        while (length != available) {
+            const char16_t c = bytes[length];
+            if ((found = c == kEquals)) break;
+            runSum += c;
+            out[length++] = c;
+        }
+        return length;
+    });
+    if (found) {
+        peek_.foundEquals = true;
+        peek_.after = savedPos + tag.length() + 1;
+        peek_.sum = runSum;
+        return tag.length();
+    }
+    tag.clear();
     int64_t sum = 0;
     const char16_t last =
         scan([&tag](char16_t c) { return c == kEquals || tag.length() == kMaxTagLength; },
@@ -66,8 +93,6 @@ int32_t KXFIXDoc::peekTag(KXWString& tag) {
              });
     // Stopped by the length bound, the character read last is not the tag's.
     peek_.foundEquals = last == kEquals && tag.length() < kMaxTagLength;
-    peek_.valid = true;
-    peek_.at = savedPos;
     peek_.after = tell();
     peek_.sum = peek_.foundEquals ? sum + last : sum;
     seek(savedPos, 0);
@@ -89,13 +114,51 @@ int32_t KXFIXDoc::readValue(KXWString& value) {
         }
         add(equals);
     }
-    // Every later "=" is dropped from the value, though it counts in the sum.
+    // Every later "=" is dropped from the value, though it counts in the sum. Buffered
+    // bytes are taken a run at a time; the rest, one character at a time.
     const char16_t separator = static_cast<unsigned char>(fieldSeparator);
-    const char16_t last = scan([separator](char16_t c) { return c == separator; },
-                               [&sum, &value](char16_t c) {
-                                   sum += c;
-                                   if (c != kEquals) value += c;
-                               });
+    char16_t last = kEnd;
+    for (;;) {
+        const unsigned char* bytes = nullptr;
+        const int32_t available = buffered(bytes);
+        if (available == 0) {
+            last = wgetch();
+            if (last == kEnd || last == separator) break;
+            sum += last;
+            if (last != kEquals) value += last;
+            continue;
+        }
+        // The room depends on the value alone, never on what happens to be buffered, so
+        // a value's storage grows the same however the file falls into buffers.
+        const int32_t room = std::max(kValueRun - value.length(), value.length());
+        const int32_t limit = std::min(available, room);
+        bool found = false;
+        int32_t run = 0;
+        value.appendRun(room, [bytes, limit, separator, &sum, &found, &run](char16_t* out) {
+            char16_t* next = out;
+            int32_t runSum = 0;
+            int32_t i = 0;
+            for (; i < limit; ++i) {
+                const char16_t c = bytes[i];
+                if (c == separator) {
+                    found = true;
+                    break;
+                }
+                runSum += c;
+                *next = c;
+                next += c != kEquals ? 1 : 0;
+            }
+            sum += runSum;
+            run = i;
+            return static_cast<int32_t>(next - out);
+        });
+        if (found) {
+            skipBuffered(run + 1);
+            last = separator;
+            break;
+        }
+        skipBuffered(run);
+    }
     if (last != kEnd) add(last);
     lastFieldSum_ = sum;
     return value.length();

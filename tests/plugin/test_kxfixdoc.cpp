@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <string>
 
 #include "fixprsr/kxfixdoc.h"
@@ -85,6 +86,39 @@ TEST(KXFIXDoc, PeekLeavesThePositionAndReadConsumesTheField) {
     TempFile other(fix("9999=X|"));
     ASSERT_EQ(doc.openfile(other.c_str(), "rbu", KX_CSET_BYTE), 0);
     EXPECT_EQ(value(doc, fix("9999=X|")), u"X");
+}
+
+// Long tags and values, "=" inside values, at every way the fields may fall across
+// buffers: each field reads as tag, value without its "=", and the sum of all it took.
+TEST(KXFIXDoc, FieldsReadTheSameWhereverBuffersEnd) {
+    const std::string longValue = std::string(1500, 'v') + "=" + std::string(1700, 'w');
+    const std::string fields[][2] = {
+        {"8", "FIX.4.4"},
+        {std::string(KXFIXDoc::kMaxTagLength - 1, '1'), "x"},
+        {"58", longValue},
+        {"58", std::string(1023, 'a')},
+        {"58", std::string(1024, 'b') + "=="},
+        {"10", "0"},
+    };
+    std::string text;
+    for (const auto& [tag, content] : fields) text += tag + "=" + content + "\x01";
+    for (const bool wide : {false, true}) {
+        TempFile file(wide ? utf16(text, false) : text);
+        for (const int32_t bufferSize : {16, 1000, 16384}) {
+            KXFIXDoc doc;
+            ASSERT_EQ(doc.openfile(file.c_str(), "rbu", wide ? KX_CSET_UTF16 : KX_CSET_BYTE), 0);
+            doc.setBufferSize(bufferSize);
+            for (const auto& [tag, content] : fields) {
+                std::string kept = content;
+                kept.erase(std::remove(kept.begin(), kept.end(), '='), kept.end());
+                EXPECT_EQ(peek(doc), std::u16string(tag.begin(), tag.end()));
+                EXPECT_EQ(value(doc, tag + "=" + content + "\x01"),
+                          std::u16string(kept.begin(), kept.end()))
+                    << tag << " in buffers of " << bufferSize << (wide ? " wide" : "");
+            }
+            EXPECT_EQ(peek(doc), u"");
+        }
+    }
 }
 
 }  // namespace
