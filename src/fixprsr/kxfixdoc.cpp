@@ -135,21 +135,21 @@ int32_t KXFIXDoc::readValue(KXWString& value) {
         bool found = false;
         int32_t run = 0;
         value.appendRun(room, [bytes, limit, separator, &sum, &found, &run](char16_t* out) {
+            const unsigned char* p = bytes;
             char16_t* next = out;
             int32_t runSum = 0;
-            int32_t i = 0;
-            for (; i < limit; ++i) {
-                const char16_t c = bytes[i];
+            while (p != bytes + limit) {
+                const char16_t c = *p;
                 if (c == separator) {
                     found = true;
                     break;
                 }
+                ++p;
                 runSum += c;
-                *next = c;
-                next += c != kEquals ? 1 : 0;
+                if (c != kEquals) *next++ = c;
             }
             sum += runSum;
-            run = i;
+            run = static_cast<int32_t>(p - bytes);
             return static_cast<int32_t>(next - out);
         });
         if (found) {

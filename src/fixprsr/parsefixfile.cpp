@@ -1,3 +1,5 @@
+#include <string_view>
+
 #include "fix/kxfixvalidator.h"
 #include "fixprsr/decimal.h"
 #include "fixprsr/fieldreport.h"
@@ -5,25 +7,23 @@
 
 namespace {
 
-bool isTag(const KXWString& tag, const char16_t* text) {
-    return !(tag != text);
-}
+using namespace std::string_view_literals;
 
 // The finding when the field at this position of the file is not the header field due
 // there; null when it is, or when the position is past the header.
 const char16_t* headerFinding(int32_t fieldPosition, const KXWString& tag) {
     struct HeaderField {
-        const char16_t* tag;
+        std::u16string_view tag;
         const char16_t* finding;
     };
     static constexpr HeaderField kHeader[] = {
-        {u"8", u"Failed to find BeginString"},
-        {u"9", u"Failed to find BodyLength"},
-        {u"35", u"Failed to find MsgType"},
+        {u"8"sv, u"Failed to find BeginString"},
+        {u"9"sv, u"Failed to find BodyLength"},
+        {u"35"sv, u"Failed to find MsgType"},
     };
     if (fieldPosition < 1 || fieldPosition > 3) return nullptr;
     const HeaderField& expected = kHeader[fieldPosition - 1];
-    return isTag(tag, expected.tag) ? nullptr : expected.finding;
+    return tag.view() == expected.tag ? nullptr : expected.finding;
 }
 
 // The total covers one message, from its BeginString to the separator before its
@@ -61,10 +61,10 @@ BATCHERR KXFIXValidator::parseFIXFile(FIXFieldMap& fieldMap, KXFIXDoc& doc, int6
         }
         const FIXField& definition = *entry->second;
         doc.readValue(fieldValue);
-        if (isTag(fieldTag, u"10")) {
+        if (fieldTag.view() == u"10"sv) {
             checkCheckSum(fieldValue, checkTotal, *this, sourceName);
         } else {
-            if (isTag(fieldTag, u"8")) checkTotal = 0;
+            if (fieldTag.view() == u"8"sv) checkTotal = 0;
             checkTotal += doc.lastFieldSum();
         }
         if (definition.getValue().length() > 0 &&
