@@ -1,15 +1,11 @@
 #include "fixprsr/kxfixdoc.h"
 
-#include <algorithm>
 #include <cwctype>
 
 namespace {
 
 constexpr char16_t kEnd = KXFileProxy::kEndOfData;
-constexpr char16_t kEquals = u'=';
 constexpr int32_t kSniffLength = 5;
-// Characters of a value copied in one pass.
-constexpr int32_t kValueRun = 1024;
 
 }  // namespace
 
@@ -57,32 +53,7 @@ bool KXFIXDoc::isFIXFile() {
     return n > 0 && start[0] == u'8';
 }
 
-int32_t KXFIXDoc::peekTag(KXWString& tag) {
-    savedPos = tell();
-    tag.clear();
-    peek_.valid = true;
-    peek_.at = savedPos;
-    // Most tags lie whole in the buffer: they are copied from there, nothing consumed.
-    const unsigned char* bytes = nullptr;
-    const int32_t available = std::min(buffered(bytes), kMaxTagLength);
-    bool found = false;
-    int64_t runSum = kEquals;
-    tag.appendRun(kMaxTagLength, [bytes, available, &found, &runSum](char16_t* out) {
-        int32_t length = 0;
-        while (length != available) {
-            const char16_t c = bytes[length];
-            if ((found = c == kEquals)) break;
-            runSum += c;
-            out[length++] = c;
-        }
-        return length;
-    });
-    if (found) {
-        peek_.foundEquals = true;
-        peek_.after = savedPos + tag.length() + 1;
-        peek_.sum = runSum;
-        return tag.length();
-    }
+int32_t KXFIXDoc::peekTagSlow(KXWString& tag) {
     tag.clear();
     int64_t sum = 0;
     const char16_t last =
@@ -92,74 +63,54 @@ int32_t KXFIXDoc::peekTag(KXWString& tag) {
                  sum += c;
              });
     // Stopped by the length bound, the character read last is not the tag's.
-    peek_.foundEquals = last == kEquals && tag.length() < kMaxTagLength;
-    peek_.after = tell();
-    peek_.sum = peek_.foundEquals ? sum + last : sum;
+    const bool foundEquals = last == kEquals && tag.length() < kMaxTagLength;
+    peek_ = {true, foundEquals, savedPos, tell(), foundEquals ? sum + last : sum};
     seek(savedPos, 0);
     return tag.length();
 }
 
-int32_t KXFIXDoc::readValue(KXWString& value) {
-    value.clear();
+int32_t KXFIXDoc::readUnpeeked(KXWString& value) {
     int64_t sum = 0;
-    const auto add = [&sum](char16_t c) { sum += c; };
-    if (peek_.valid && peek_.foundEquals && peek_.at == tell()) {
-        seek(peek_.after, 0);
-        sum = peek_.sum;
-    } else {
-        const char16_t equals = scan([](char16_t c) { return c == kEquals; }, add);
-        if (equals == kEnd) {
-            lastFieldSum_ = sum;
-            return 0;
-        }
-        add(equals);
+    const char16_t equals =
+        scan([](char16_t c) { return c == kEquals; }, [&sum](char16_t c) { sum += c; });
+    if (equals == kEnd) {
+        lastFieldSum_ = sum;
+        return 0;
     }
-    // Every later "=" is dropped from the value, though it counts in the sum. Buffered
-    // bytes are taken a run at a time; the rest, one character at a time.
-    const char16_t separator = static_cast<unsigned char>(fieldSeparator);
-    char16_t last = kEnd;
+    return readRest(value, sum + equals);
+}
+
+// Buffered bytes are taken a run at a time; the rest, one character at a time. Every
+// later "=" is dropped from the value, though it counts in the sum.
+int32_t KXFIXDoc::readRest(KXWString& value, int64_t sum) {
+    const auto separator = static_cast<unsigned char>(fieldSeparator);
     for (;;) {
         const unsigned char* bytes = nullptr;
         const int32_t available = buffered(bytes);
         if (available == 0) {
-            last = wgetch();
-            if (last == kEnd || last == separator) break;
-            sum += last;
-            if (last != kEquals) value += last;
+            const char16_t c = wgetch();
+            if (c == kEnd) break;
+            sum += c;
+            if (c == separator) break;
+            if (c != kEquals) value += c;
             continue;
         }
         // The room depends on the value alone, never on what happens to be buffered, so
         // a value's storage grows the same however the file falls into buffers.
         const int32_t room = std::max(kValueRun - value.length(), value.length());
-        const int32_t limit = std::min(available, room);
-        bool found = false;
-        int32_t run = 0;
-        value.appendRun(room, [bytes, limit, separator, &sum, &found, &run](char16_t* out) {
-            const unsigned char* p = bytes;
-            char16_t* next = out;
-            int32_t runSum = 0;
-            while (p != bytes + limit) {
-                const char16_t c = *p;
-                if (c == separator) {
-                    found = true;
-                    break;
-                }
-                ++p;
-                runSum += c;
-                if (c != kEquals) *next++ = c;
-            }
-            sum += runSum;
-            run = static_cast<int32_t>(p - bytes);
-            return static_cast<int32_t>(next - out);
+        Run run;
+        value.appendRun(room, [&](char16_t* out) {
+            run = copyRun(bytes, std::min(available, room), separator, out);
+            return run.written;
         });
-        if (found) {
-            skipBuffered(run + 1);
-            last = separator;
+        sum += run.sum;
+        if (run.stopped) {
+            skipBuffered(run.taken + 1);
+            sum += separator;
             break;
         }
-        skipBuffered(run);
+        skipBuffered(run.taken);
     }
-    if (last != kEnd) add(last);
     lastFieldSum_ = sum;
     return value.length();
 }

@@ -1,6 +1,7 @@
 // Reader that sees a source file as FIX fields: tag, "=", value, separator.
 #pragma once
 
+#include <algorithm>
 #include <cstdint>
 
 #include "kxutil/kxfileproxy.h"
@@ -25,13 +26,83 @@ class KXVFIX_API KXFIXDoc : public KXFileProxy {
     // with "8". The reader is left on that first significant character.
     bool isFIXFile();
     // The next field's tag (everything before the next "="); nothing is consumed.
-    int32_t peekTag(KXWString& tag);
+    // Inline, as are the usual cases of readValue, because the walk calls both for
+    // every field: most fields lie whole in the buffer and are copied from there.
+    int32_t peekTag(KXWString& tag) {
+        savedPos = tell();
+        tag.clear();
+        const unsigned char* bytes = nullptr;
+        const int32_t available = std::min(buffered(bytes), kMaxTagLength);
+        Run run;
+        tag.appendRun(kMaxTagLength, [&](char16_t* out) {
+            run = copyRun(bytes, available, kEquals, out);
+            return run.written;
+        });
+        if (!run.stopped) return peekTagSlow(tag);
+        peek_ = {true, true, savedPos, savedPos + run.taken + 1, run.sum + kEquals};
+        return tag.length();
+    }
     // Consumes one field and yields its value (every "=" dropped, up to the separator).
-    int32_t readValue(KXWString& value);
+    int32_t readValue(KXWString& value) {
+        value.clear();
+        if (!peek_.valid || !peek_.foundEquals || peek_.at != tell()) return readUnpeeked(value);
+        seek(peek_.after, 0);
+        const unsigned char* bytes = nullptr;
+        const int32_t available = std::min(buffered(bytes), kValueRun);
+        const auto separator = static_cast<unsigned char>(fieldSeparator);
+        Run run;
+        value.appendRun(kValueRun, [&](char16_t* out) {
+            run = copyRun(bytes, available, separator, out);
+            return run.written;
+        });
+        if (!run.stopped) {
+            value.clear();
+            return readRest(value, peek_.sum);
+        }
+        skipBuffered(run.taken + 1);
+        lastFieldSum_ = peek_.sum + run.sum + separator;
+        return value.length();
+    }
     // Sum of the codes of every character the last readValue consumed.
     int64_t lastFieldSum() const { return lastFieldSum_; }
 
   private:
+    static constexpr char16_t kEquals = u'=';
+    // Characters of a value copied in one pass.
+    static constexpr int32_t kValueRun = 1024;
+
+    struct Run {
+        int32_t taken = 0;    // bytes gone through, the stop not counted
+        int32_t written = 0;  // characters written
+        int64_t sum = 0;      // codes of the bytes gone through
+        bool stopped = false;
+    };
+    // Widens bytes into out up to the first stop, at most limit of them, leaving out
+    // every "=". out has room for limit characters.
+    static Run copyRun(const unsigned char* bytes, int32_t limit, unsigned char stop,
+                       char16_t* out) {
+        Run run;
+        int32_t sum = 0;  // at most kValueRun bytes
+        for (; run.taken < limit; ++run.taken) {
+            const unsigned char c = bytes[run.taken];
+            if (c == stop) {
+                run.stopped = true;
+                break;
+            }
+            sum += c;
+            if (c != kEquals) out[run.written++] = c;
+        }
+        run.sum = sum;
+        return run;
+    }
+    // The cases the inline readers leave: a field across buffers, UTF-16, a tag
+    // without "=", a field that was not peeked at.
+    int32_t peekTagSlow(KXWString& tag);
+    int32_t readUnpeeked(KXWString& value);
+    // The value from here, just past its "=", to the separator; sum holds the codes
+    // consumed so far.
+    int32_t readRest(KXWString& value, int64_t sum);
+
     // Where the last peekTag found its field, so that reading the field that was peeked
     // at does not read its tag again. Forgotten whenever a file is opened.
     struct Peek {
