@@ -4,9 +4,10 @@
 # and the host libraries kxutil.dll and kxapi.dll (the compiler's runtime is linked in).
 set -eu
 bin=$1
+objdump=i686-w64-mingw32-objdump
 status=0
 
-exports=$(objdump -p "$bin/kxvfix.dll" |
+exports=$($objdump -p "$bin/kxvfix.dll" |
   sed -n '/^\[Ordinal\/Name Pointer\] Table/,/^$/s/^[[:space:]]*\[ *[0-9]*\] //p' | sort | xargs)
 echo "kxvfix.dll exports: $exports"
 if [ "$exports" != "_DeleteValidator@4 _NewValidator@0" ]; then
@@ -15,7 +16,7 @@ if [ "$exports" != "_DeleteValidator@4 _NewValidator@0" ]; then
 fi
 
 for module in kxvfix.dll kxutil.dll kxapi.dll kxvalidate.exe; do
-  imports=$(objdump -p "$bin/$module" | sed -n 's/^[[:space:]]*DLL Name: //p' | xargs)
+  imports=$($objdump -p "$bin/$module" | sed -n 's/^[[:space:]]*DLL Name: //p' | xargs)
   echo "$module imports: $imports"
   for dll in $imports; do
     case $(echo "$dll" | tr 'A-Z' 'a-z') in
