@@ -17,7 +17,7 @@ class Plugin {
     const std::string& error() const { return error_; }
 
     struct Deleter {
-        void (*destroy)(KXValidator*);
+        void(KX_STDCALL* destroy)(KXValidator*);
         void operator()(KXValidator* v) const { destroy(v); }
     };
     using ValidatorPtr = std::unique_ptr<KXValidator, Deleter>;
@@ -26,7 +26,7 @@ class Plugin {
 
   private:
     void* handle_ = nullptr;
-    KXValidator* (*new_)() = nullptr;
-    void (*delete_)(KXValidator*) = nullptr;
+    KXValidator*(KX_STDCALL* new_)() = nullptr;
+    void(KX_STDCALL* delete_)(KXValidator*) = nullptr;
     std::string error_;
 };

@@ -1,7 +1,13 @@
 // Helpers shared by the tests: files written for one test and removed after it.
 #pragma once
 
+#if defined(_WIN32)
+#include <windows.h>
+
+#include <atomic>
+#else
 #include <unistd.h>
+#endif
 
 #include <cstdio>
 #include <cstdlib>
@@ -10,15 +16,39 @@
 
 namespace testutil {
 
+#if defined(_WIN32)
+// The system's directory for temporary files, with its trailing backslash.
+inline std::string temporaryDirectory() {
+    char dir[MAX_PATH + 1];
+    const DWORD n = GetTempPathA(sizeof dir, dir);
+    return n > 0 && n < sizeof dir ? std::string(dir, n) : std::string(".\\");
+}
+
+// A name no other test process uses.
+inline std::string temporaryName(const std::string& suffix) {
+    static std::atomic<unsigned> counter{0};
+    return temporaryDirectory() + "kxvfix" + std::to_string(GetCurrentProcessId()) + "-" +
+           std::to_string(counter++) + suffix;
+}
+#else
+inline std::string temporaryDirectory() {
+    const char* dir = std::getenv("TMPDIR");
+    return std::string(dir != nullptr ? dir : "/tmp") + "/";
+}
+
+inline std::string temporaryName(const std::string& suffix) {
+    std::string pattern = temporaryDirectory() + "kxvfixXXXXXX" + suffix;
+    const int fd = mkstemps(pattern.data(), static_cast<int>(suffix.size()));
+    if (fd >= 0) ::close(fd);
+    return pattern;
+}
+#endif
+
 // A file under the temporary directory, holding the given bytes, removed on destruction.
 class TempFile {
   public:
-    explicit TempFile(const std::string& bytes, const std::string& suffix = ".dat") {
-        const char* dir = std::getenv("TMPDIR");
-        std::string pattern = std::string(dir != nullptr ? dir : "/tmp") + "/kxvfixXXXXXX" + suffix;
-        const int fd = mkstemps(pattern.data(), static_cast<int>(suffix.size()));
-        if (fd >= 0) ::close(fd);
-        path_ = pattern;
+    explicit TempFile(const std::string& bytes, const std::string& suffix = ".dat")
+        : path_(temporaryName(suffix)) {
         std::ofstream(path_, std::ios::binary) << bytes;
     }
     TempFile(const TempFile&) = delete;
@@ -31,7 +61,6 @@ class TempFile {
   private:
     std::string path_;
 };
-
 // UTF-16 bytes of ASCII text, least or most significant byte first.
 inline std::string utf16(const std::string& text, bool msbFirst) {
     std::string out;

@@ -38,7 +38,7 @@ class KXAPI_API KXValidator {
     // it or it offers no callback.
     virtual BATCHERR GetOption(const char16_t* name, KXWString& value) const;
     virtual BATCHERR SetOption(const char16_t* name, const char16_t* value);
-    // Lines of NAME=VALUE (UTF-8), each set with SetOption; others are skipped.
+    // Lines of NAME=VALUE (in character set 0), each set with SetOption; others are skipped.
     virtual void LoadOptions(KXString& text);
     // Sets every option to its definition's default value.
     virtual void LoadDynamicOptions();

@@ -11,7 +11,7 @@
 #include <fcntl.h>
 #include <io.h>
 #include <sys/stat.h>
-#include <string>
+#include <windows.h>
 #else
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -35,7 +35,8 @@ bool isDirectory(int32_t fd) {
 
 int32_t openReadOnly(const char16_t* path) {
 #if defined(_WIN32)
-    const int32_t fd = _wopen(reinterpret_cast<const wchar_t*>(path), _O_RDONLY | _O_BINARY);
+    const int32_t fd =
+        _wopen(reinterpret_cast<const wchar_t*>(path), _O_RDONLY | _O_BINARY | _O_NOINHERIT);
 #else
     KXString narrow;
     narrow.Assign(path, KX_CSET_DEFAULT);
@@ -56,8 +57,16 @@ int32_t openReadOnly(const char16_t* path) {
 // descriptor's own offset.
 int32_t readAt(int32_t fd, unsigned char* buffer, int32_t count, int64_t offset) {
 #if defined(_WIN32)
-    if (_lseeki64(fd, offset, SEEK_SET) < 0) return -1;
-    return _read(fd, buffer, static_cast<unsigned>(count));
+    // A duplicate shares the file pointer, so the offset goes with the read itself.
+    const auto handle = reinterpret_cast<HANDLE>(_get_osfhandle(fd));
+    if (handle == INVALID_HANDLE_VALUE) return -1;
+    OVERLAPPED at{};
+    at.Offset = static_cast<DWORD>(offset);
+    at.OffsetHigh = static_cast<DWORD>(static_cast<uint64_t>(offset) >> 32);
+    DWORD n = 0;
+    if (ReadFile(handle, buffer, static_cast<DWORD>(count), &n, &at))
+        return static_cast<int32_t>(n);
+    return GetLastError() == ERROR_HANDLE_EOF ? 0 : -1;
 #else
     for (;;) {
         const ssize_t n = ::pread(fd, buffer, static_cast<size_t>(count), offset);
@@ -83,6 +92,12 @@ void closeDescriptor(int32_t fd) {
 }
 
 }  // namespace
+
+#if defined(_WIN32)
+// An importer that binds a constant to a reference links to the DLL's own definition.
+constexpr char16_t KXFileProxy::kEndOfData;
+constexpr int32_t KXFileProxy::kDefaultBufferSize;
+#endif
 
 KXFileProxy::KXFileProxy() = default;
 

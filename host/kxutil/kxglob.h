@@ -10,7 +10,7 @@ namespace KXGlob {
 
 enum LogLevel : int32_t { kWarning = 2, kError = 4, kFatal = 8 };
 
-// Receives every formatted log line (UTF-8, no line break).
+// Receives every formatted log line (in character set 0, no line break).
 using LogSink = void (*)(int32_t level, BATCHERR code, const char* line, void* context);
 
 // printf-style: %d takes an int32_t, %s a zero-terminated UTF-16 text, %% a percent sign.

@@ -53,6 +53,9 @@ void appendUtf8(int32_t cp, std::string& out) {
 }  // namespace
 
 bool toUtf16(const char* text, size_t length, KX_CSET cset, std::u16string& out) {
+#if defined(_WIN32)
+    if (cset == KX_CSET_DEFAULT) return acpToUtf16(text, length, out);
+#endif
     out.clear();
     out.reserve(length);
     const auto* bytes = reinterpret_cast<const unsigned char*>(text);
@@ -77,6 +80,9 @@ bool toUtf16(const char* text, size_t length, KX_CSET cset, std::u16string& out)
 }
 
 bool fromUtf16(const char16_t* text, size_t length, KX_CSET cset, std::string& out) {
+#if defined(_WIN32)
+    if (cset == KX_CSET_DEFAULT) return utf16ToAcp(text, length, out);
+#endif
     out.clear();
     out.reserve(length);
     bool lossless = true;

@@ -13,4 +13,10 @@ namespace kxutil {
 bool toUtf16(const char* text, size_t length, KX_CSET cset, std::u16string& out);
 bool fromUtf16(const char16_t* text, size_t length, KX_CSET cset, std::string& out);
 
+#if defined(_WIN32)
+// KX_CSET_DEFAULT there: the ANSI code page (acp.cpp).
+bool acpToUtf16(const char* text, size_t length, std::u16string& out);
+bool utf16ToAcp(const char16_t* text, size_t length, std::string& out);
+#endif
+
 }  // namespace kxutil

@@ -4,6 +4,7 @@ import io
 import json
 import os
 import re
+import shlex
 import subprocess
 import sys
 import tempfile
@@ -14,6 +15,13 @@ sys.path.insert(0, os.path.join(ROOT, "bench"))
 import gen_corpus  # noqa: E402
 
 KXVALIDATE = os.environ.get("KXVALIDATE", "kxvalidate")
+# What runs the program, if it does not run by itself: "wine" for a Windows build.
+RUNNER = shlex.split(os.environ.get("KXVALIDATE_RUNNER", ""))
+# What the program writes in: UTF-8, or the ANSI code page of a Windows build.
+ENCODING = os.environ.get("KXVALIDATE_ENCODING", "utf-8")
+# A Windows program run from here (under wine) sees this file system as drive Z:.
+WINDOWS = KXVALIDATE.lower().endswith(".exe") and os.name == "posix"
+NULL_DEVICE = "NUL" if WINDOWS else os.devnull
 SOH = "\x01"
 
 SCHEMA = """<?xml version="1.0"?>
@@ -37,6 +45,11 @@ SCHEMA = """<?xml version="1.0"?>
 """
 
 
+def program_path(path):
+    """The name the program under test gives the file at path."""
+    return "Z:" + path.replace("/", "\\") if WINDOWS else path
+
+
 def message(*fields):
     """A message of tag=value pairs with correct BodyLength and CheckSum."""
     body = "".join(f"{t}={v}{SOH}" for t, v in fields)
@@ -56,15 +69,18 @@ class KxvalidateTest(unittest.TestCase):
     def tearDown(self):
         self.dir.cleanup()
 
+    def local(self, name):
+        return os.path.join(self.dir.name, name)
+
     def write(self, name, content):
-        path = os.path.join(self.dir.name, name)
-        with open(path, "wb") as f:
+        """Writes the file and answers its name for the program."""
+        with open(self.local(name), "wb") as f:
             f.write(content.encode() if isinstance(content, str) else content)
-        return path
+        return program_path(self.local(name))
 
     def run_cli(self, *args, schema=True):
-        cmd = [KXVALIDATE] + (["-s", self.schema] if schema else []) + list(args)
-        return subprocess.run(cmd, capture_output=True, text=True, timeout=60)
+        cmd = RUNNER + [KXVALIDATE] + (["-s", self.schema] if schema else []) + list(args)
+        return subprocess.run(cmd, capture_output=True, encoding=ENCODING, timeout=60)
 
     def json_lines(self, *args, schema=True):
         done = self.run_cli("--format", "json", *args, schema=schema)
@@ -80,7 +96,7 @@ class KxvalidateTest(unittest.TestCase):
         bad_schema = self.write("bad.xml", "<Specification><Field>")
         not_fix = self.write("nine.fix", "9=5" + SOH + ORDER)
         comments = self.write("comments.fix", "; nothing\n\n")
-        missing = os.path.join(self.dir.name, "missing.fix")
+        missing = program_path(self.local("missing.fix"))
         cases = [
             (["-o", "SchemaFile=", source], "?", "No schema specs file is found!"),
             (["-s", bad_schema, source], bad_schema, "Not a valid schema spec file!"),
@@ -148,7 +164,7 @@ class KxvalidateTest(unittest.TestCase):
     def test_several_files_and_jobs(self):
         good = self.write("good.fix", ORDER)
         bad = self.write("bad.fix", ORDER.replace("35=D", "35=Q"))
-        missing = os.path.join(self.dir.name, "none.fix")
+        missing = program_path(self.local("none.fix"))
         files = [good, missing, bad, good]
         one = self.run_cli(*files)
         self.assertEqual(one.returncode, 2)
@@ -172,10 +188,10 @@ class KxvalidateTest(unittest.TestCase):
         self.assertEqual(done.returncode, 0, done.stdout)
 
     def test_examples_with_the_bundled_schema(self):
-        examples = os.path.join(ROOT, "examples")
-        clean = [os.path.join(examples, n) for n in ("orders.fix", "executions.fix")]
+        examples = os.path.normpath(os.path.join(ROOT, "examples"))
+        clean = [program_path(os.path.join(examples, n)) for n in ("orders.fix", "executions.fix")]
         self.assertEqual(self.run_cli(*clean, schema=False).returncode, 0)
-        faults = os.path.join(examples, "faults.fix")
+        faults = program_path(os.path.join(examples, "faults.fix"))
         done, objects = self.json_lines(faults, schema=False)
         self.assertEqual([o.get("message") for o in objects[:-1]], [
             "Field 54 failed to match specified value", "The Checksum is incorrect",
@@ -206,17 +222,19 @@ class KxvalidateTest(unittest.TestCase):
     def test_hostile_sources_and_schemas(self):
         # Each gets a clear answer, in bounded time and memory; none may crash the program.
         gib = self.write("gib.fix", "8")
-        os.truncate(gib, 1 << 30)  # sparse: a 1 GiB tag without "=" after the "8"
+        os.truncate(self.local("gib.fix"), 1 << 30)  # sparse: a 1 GiB tag without "=" after "8"
         endless = self.write("endless.fix", "8=")
-        os.truncate(endless, 16 << 20)  # a BeginString value with no separator to end it
-        nuls = self.write("nul.fix", ORDER.replace("11=ABC", "11=A\x00C"))
+        os.truncate(self.local("endless.fix"), 16 << 20)  # a BeginString without its separator
+        # Not nul.fix: Windows opens any "nul.*" as its null device.
+        nuls = self.write("nuls.fix", ORDER.replace("11=ABC", "11=A\x00C"))
         cut = self.write("cut.fix", ORDER[:-3])  # inside the CheckSum value
         odd = self.write("odd.fix", b"\xff\xfe" + ORDER.encode("utf-16-le") + b"8")
+        folder = program_path(self.dir.name)
         cases = [  # arguments, exit status, first line of the output
-            ([self.dir.name], 2, f"{self.dir.name}: error: Unable to open source file!"),
-            (["/dev/null"], 2, "/dev/null: error: Source file is not a FIX file!"),
-            (["-s", self.dir.name, cut], 2, f"{self.dir.name}: error: Not a valid schema spec file!"),
-            (["-s", "/dev/null", cut], 2, "/dev/null: error: Not a valid schema spec file!"),
+            ([folder], 2, f"{folder}: error: Unable to open source file!"),
+            ([NULL_DEVICE], 2, f"{NULL_DEVICE}: error: Source file is not a FIX file!"),
+            (["-s", folder, cut], 2, f"{folder}: error: Not a valid schema spec file!"),
+            (["-s", NULL_DEVICE, cut], 2, f"{NULL_DEVICE}: error: Not a valid schema spec file!"),
             ([gib], 1, f"{gib}: error: Failed to find BeginString"),
             ([endless], 1, f"{endless}: field error: Field 8 failed to match specified value"),
             ([nuls], 1, f"{nuls}: error: The Checksum is incorrect"),
@@ -231,11 +249,11 @@ class KxvalidateTest(unittest.TestCase):
     @unittest.skipIf(os.geteuid() == 0, "the superuser reads files without read permission")
     def test_unreadable_source_and_schema(self):
         source = self.write("locked.fix", ORDER)
-        os.chmod(source, 0)
-        os.chmod(self.schema, 0)
+        os.chmod(self.local("locked.fix"), 0)
+        os.chmod(self.local("schema.xml"), 0)
         self.assertEqual(self.run_cli(source).stdout.splitlines()[0],
                          f"{self.schema}: error: Not a valid schema spec file!")
-        os.chmod(self.schema, 0o644)
+        os.chmod(self.local("schema.xml"), 0o644)
         self.assertEqual(self.run_cli(source).stdout.splitlines()[0],
                          f"{source}: error: Unable to open source file!")
 

@@ -1,9 +1,13 @@
 #include <gtest/gtest.h>
 #include <unistd.h>
 
+#include <algorithm>
+#include <cctype>
+#include <cstdio>
 #include <string>
 
 #include "kxutil/kxfileproxy.h"
+#include "kxutil/kxwstring.h"
 #include "testutil.h"
 
 namespace {
@@ -62,7 +66,10 @@ TEST(KXFileProxy, SeeksInsideOrOutsideTheBufferCopiesKeepTheFileAndBadOpensAreRe
     }
     EXPECT_TRUE(proxy.isOpen());
     EXPECT_EQ(proxy.wgetch(), u'2');
-    for (const int64_t position : {15, 3, 4, 19, 0, 20, 8}) {
+    // Past 4 GiB: a position cut to 32 bits would read "1" again.
+    const int64_t beyond32Bits = (int64_t{1} << 32) + 1;
+    for (const int64_t position : {int64_t{15}, int64_t{3}, int64_t{4}, int64_t{19}, int64_t{0},
+                                   int64_t{20}, beyond32Bits, int64_t{8}}) {
         ASSERT_EQ(proxy.seek(position, 0), 0);
         EXPECT_EQ(proxy.tell(), position);
         EXPECT_EQ(proxy.wgetch(), position < 20 ? text[position] : KXFileProxy::kEndOfData);
@@ -78,7 +85,7 @@ TEST(KXFileProxy, SeeksInsideOrOutsideTheBufferCopiesKeepTheFileAndBadOpensAreRe
     EXPECT_STREQ(buffer, "89ab");
     EXPECT_EQ(proxy.getch(), -1);
     EXPECT_EQ(proxy.openfile("/nonexistent/kxvfix/file", "rb", KX_CSET_BYTE), -1);
-    EXPECT_EQ(proxy.openfile("/tmp", "rb", KX_CSET_BYTE), -1);  // a directory
+    EXPECT_EQ(proxy.openfile(testutil::temporaryDirectory().c_str(), "rb", KX_CSET_BYTE), -1);
     EXPECT_EQ(proxy.openfile(file.c_str(), "wb", KX_CSET_BYTE), -1);
     EXPECT_EQ(proxy.openfile(file.c_str(), "rb", KX_CSET_DEFAULT), -1);
     EXPECT_FALSE(proxy.isOpen());
@@ -86,5 +93,34 @@ TEST(KXFileProxy, SeeksInsideOrOutsideTheBufferCopiesKeepTheFileAndBadOpensAreRe
     EXPECT_LT(proxy.read(buffer, 4), 0);
     EXPECT_EQ(proxy.close(false), -1);
 }
+
+#if defined(_WIN32)
+TEST(KXFileProxy, OpensWindowsPathsInEitherSpellingAndWideNamesWithoutLoss) {
+    TempFile file("8=FIX");
+    std::string forward = file.path();
+    std::replace(forward.begin(), forward.end(), '\\', '/');
+    std::string lowerDrive = file.path();
+    lowerDrive[0] = static_cast<char>(std::tolower(static_cast<unsigned char>(lowerDrive[0])));
+    ASSERT_EQ(file.path().substr(1, 2), ":\\");
+    KXFileProxy proxy;
+    for (const std::string& path : {file.path(), forward, lowerDrive}) {
+        ASSERT_EQ(proxy.openfile(path.c_str(), "rb", KX_CSET_BYTE), 0) << path;
+        EXPECT_EQ(readAll(proxy), u"8=FIX") << path;
+    }
+    // Beyond the ANSI code page: the UTF-16 name reaches the system unconverted.
+    KXWString wide;
+    wide.Assign(testutil::temporaryDirectory().c_str(), KX_CSET_DEFAULT);
+    wide += u"kxvfix-\u03C9\u4E2D.dat";
+    const auto* name = reinterpret_cast<const wchar_t*>(wide.c_str());
+    FILE* out = _wfopen(name, L"wb");
+    ASSERT_NE(out, nullptr);
+    std::fputs("8=", out);
+    std::fclose(out);
+    EXPECT_EQ(proxy.openfile(wide.c_str(), "rb", KX_CSET_BYTE), 0);
+    EXPECT_EQ(readAll(proxy), u"8=");
+    proxy.close(false);
+    _wremove(name);
+}
+#endif
 
 }  // namespace

@@ -1,6 +1,11 @@
-// The plug-in as a host meets it: loaded with dlopen, validators from NewValidator.
-#include <dlfcn.h>
+// The plug-in as a host meets it: loaded at run time, validators from NewValidator.
 #include <gtest/gtest.h>
+
+#if defined(_WIN32)
+#include <windows.h>
+#else
+#include <dlfcn.h>
+#endif
 
 #include <atomic>
 #include <cstdlib>
@@ -29,16 +34,37 @@ void operator delete(void* p, size_t) noexcept {
 
 namespace {
 
-using NewFn = KXValidator* (*)();
-using DeleteFn = void (*)(KXValidator*);
+using NewFn = KXValidator*(KX_STDCALL*)();
+using DeleteFn = void(KX_STDCALL*)(KXValidator*);
+
+#if defined(_WIN32)
+void* openPlugin() {
+    return reinterpret_cast<void*>(LoadLibraryA(KXVFIX_PLUGIN_PATH));
+}
+void* findSymbol(void* library, const char* name) {
+    return reinterpret_cast<void*>(GetProcAddress(static_cast<HMODULE>(library), name));
+}
+// Hosts look the entry points up by their decorated standard-call names.
+constexpr const char* kNewName = "_NewValidator@0";
+constexpr const char* kDeleteName = "_DeleteValidator@4";
+#else
+void* openPlugin() {
+    return dlopen(KXVFIX_PLUGIN_PATH, RTLD_NOW | RTLD_LOCAL);
+}
+void* findSymbol(void* library, const char* name) {
+    return dlsym(library, name);
+}
+constexpr const char* kNewName = "NewValidator";
+constexpr const char* kDeleteName = "DeleteValidator";
+#endif
 
 class PluginTest : public ::testing::Test {
   protected:
     static void SetUpTestSuite() {
-        handle_ = dlopen(KXVFIX_PLUGIN_PATH, RTLD_NOW | RTLD_LOCAL);
-        ASSERT_NE(handle_, nullptr) << dlerror();
-        newValidator_ = reinterpret_cast<NewFn>(dlsym(handle_, "NewValidator"));
-        deleteValidator_ = reinterpret_cast<DeleteFn>(dlsym(handle_, "DeleteValidator"));
+        handle_ = openPlugin();
+        ASSERT_NE(handle_, nullptr) << KXVFIX_PLUGIN_PATH;
+        newValidator_ = reinterpret_cast<NewFn>(findSymbol(handle_, kNewName));
+        deleteValidator_ = reinterpret_cast<DeleteFn>(findSymbol(handle_, kDeleteName));
         ASSERT_NE(newValidator_, nullptr);
         ASSERT_NE(deleteValidator_, nullptr);
     }
@@ -80,6 +106,33 @@ TEST_F(PluginTest, OptionsRoundTripInTableOrderAndValidatorsAreIndependent) {
     EXPECT_EQ(v->GetOption(u"Schema", value), BATCH_UNKNOWN_OPTION);
     deleteValidator_(v);
 }
+
+#if defined(_WIN32)
+TEST_F(PluginTest, ExportsOnlyTheDecoratedStandardCallNames) {
+    for (const char* name : {"NewValidator", "DeleteValidator", "NewValidator@0",
+                             "DeleteValidator@4", "_NewValidator", "_DeleteValidator"})
+        EXPECT_EQ(findSymbol(handle_, name), nullptr) << name;
+}
+
+TEST_F(PluginTest, DeleteValidatorTakesItsArgumentOffTheStack) {
+    KXValidator* v = newValidator_();
+    ASSERT_NE(v, nullptr);
+    // Called by hand, so that a caller-cleans convention shows as a stack 4 bytes lower;
+    // the stack pointer is put back either way.
+    int32_t drift = 0;
+    asm volatile(
+        "movl %%esp, %%esi\n\t"
+        "pushl %1\n\t"
+        "call *%2\n\t"
+        "movl %%esp, %0\n\t"
+        "subl %%esi, %0\n\t"
+        "movl %%esi, %%esp"
+        : "=r"(drift)
+        : "r"(v), "r"(deleteValidator_)
+        : "esi", "eax", "ecx", "edx", "memory", "cc");
+    EXPECT_EQ(drift, 0);
+}
+#endif
 
 #if defined(KXVFIX_TEST_MIMALLOC)
 TEST_F(PluginTest, PluginAllocatesFromItsOwnAllocatorOnly) {

@@ -1,8 +1,11 @@
-#include <arpa/inet.h>
 #include <gtest/gtest.h>
+#include <xercesc/util/PlatformUtils.hpp>
+
+#if !defined(_WIN32)
+#include <arpa/inet.h>
 #include <sys/socket.h>
 #include <unistd.h>
-#include <xercesc/util/PlatformUtils.hpp>
+#endif
 
 #include <algorithm>
 #include <atomic>
@@ -118,6 +121,9 @@ TEST(SchemaReader, LogsEachParserDiagnosticOnce) {
 }
 
 TEST(SchemaReader, ReadsLocalEntitiesButNothingFromTheNetwork) {
+#if defined(_WIN32)
+    GTEST_SKIP() << "the loopback listener that counts fetches uses POSIX sockets";
+#else
     // A loopback listener counts what would have been fetched.
     const int listener = socket(AF_INET, SOCK_STREAM, 0);
     sockaddr_in address{AF_INET, 0, {htonl(INADDR_LOOPBACK)}, {}};
@@ -145,6 +151,7 @@ TEST(SchemaReader, ReadsLocalEntitiesButNothingFromTheNetwork) {
                 s.log[0].find(url) != std::string::npos)
         << s.log[0];
     EXPECT_EQ(std::u16string(s.at(u"1")->getValue().c_str()), u"Y|N|A|B");
+#endif
 }
 
 // Misplaced and unfinished elements: the sanitizer build reports any leak or double free.
