@@ -11,8 +11,7 @@ BATCHERR KXFIXValidator::parseGroup(FIXFieldList* fields, KXFIXDoc& doc, int rep
     if (repetitions > 0) groupLevels.push_back({fields, repetitions, 1, false});
     while (!groupLevels.empty()) {
         GroupLevel& level = groupLevels.back();
-        const int32_t memberCount = level.fields != nullptr ? level.fields->getCount() : 0;
-        if (level.member >= memberCount) {
+        if (level.fields == nullptr || level.member >= level.fields->getCount()) {
             --level.repetitions;
             // A repetition that read nothing left the reader where it was: every later
             // one would repeat it, findings included.
