@@ -82,16 +82,22 @@ class KXVFIX_API KXFIXDoc : public KXFileProxy {
     static Run copyRun(const unsigned char* bytes, int32_t limit, unsigned char stop,
                        char16_t* out) {
         Run run;
+        const unsigned char* p = bytes;
+        const unsigned char* const end = bytes + limit;
+        char16_t* next = out;
         int32_t sum = 0;  // at most kValueRun bytes
-        for (; run.taken < limit; ++run.taken) {
-            const unsigned char c = bytes[run.taken];
+        while (p != end) {
+            const unsigned char c = *p;
             if (c == stop) {
                 run.stopped = true;
                 break;
             }
+            ++p;
             sum += c;
-            if (c != kEquals) out[run.written++] = c;
+            if (c != kEquals) *next++ = c;
         }
+        run.taken = static_cast<int32_t>(p - bytes);
+        run.written = static_cast<int32_t>(next - out);
         run.sum = sum;
         return run;
     }
