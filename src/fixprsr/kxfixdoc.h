@@ -85,7 +85,7 @@ class KXVFIX_API KXFIXDoc : public KXFileProxy {
         const unsigned char* p = bytes;
         const unsigned char* const end = bytes + limit;
         char16_t* next = out;
-        int32_t sum = 0;  // at most kValueRun bytes
+        int64_t sum = 0;
         while (p != end) {
             const unsigned char c = *p;
             if (c == stop) {
